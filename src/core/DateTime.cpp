@@ -1,0 +1,441 @@
+#include "core/DateTime.h"
+
+#include <array>
+#include <cmath>
+#include <cstring>
+
+#include "core/Errors.h"
+#include "core/Numbers.h"
+#include "core/Text.h"
+
+namespace molvar {
+namespace {
+
+constexpr int64_t kSecondsPerDay = 86400;
+
+// Days from 1970-01-01 (proleptic Gregorian), after H. Hinnant's days_from_civil.
+int64_t DaysFromCivil(int64_t y, int m, int d) {
+  y -= m <= 2;
+  const int64_t era = (y >= 0 ? y : y - 399) / 400;
+  const int64_t yoe = y - era * 400;
+  const int64_t doy = (153 * (m + (m > 2 ? -3 : 9)) + 2) / 5 + d - 1;
+  const int64_t doe = yoe * 365 + yoe / 4 - yoe / 100 + doy;
+  return era * 146097 + doe - 719468;
+}
+
+constexpr int64_t kEpochDaysFrom1970 = -25569;  // 1899-12-30
+
+bool IsLeap(int y) { return (y % 4 == 0 && y % 100 != 0) || y % 400 == 0; }
+
+int DaysInMonth(int y, int m) {
+  static constexpr std::array<int, 12> kDays = {31, 28, 31, 30, 31, 30, 31, 31, 30, 31, 30, 31};
+  return m == 2 && IsLeap(y) ? 29 : kDays[static_cast<std::size_t>(m - 1)];
+}
+
+const TimeSeconds kMinTime = (DaysFromCivil(100, 1, 1) - kEpochDaysFrom1970) * kSecondsPerDay;
+const TimeSeconds kMaxTime =
+    (DaysFromCivil(9999, 12, 31) - kEpochDaysFrom1970) * kSecondsPerDay + kSecondsPerDay - 1;
+
+bool IsDigit(char c) { return c >= '0' && c <= '9'; }
+bool IsAlpha(char c) { return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z'); }
+
+int MonthFromName(std::string_view name) {
+  static constexpr std::array<std::string_view, 12> kMonths = {
+      "january", "february", "march",     "april",   "may",      "june",
+      "july",    "august",   "september", "october", "november", "december"};
+  if (name.size() < 3) return 0;
+  for (std::size_t i = 0; i < kMonths.size(); ++i) {
+    const std::string_view full = kMonths[i];
+    if (name.size() > full.size()) continue;
+    if (EqualsNoCase(name, full.substr(0, name.size())) && (name.size() == 3 || name.size() == full.size() ||
+                                                             (name.size() == 4 && i == 8))) {
+      return static_cast<int>(i) + 1;
+    }
+  }
+  return 0;
+}
+
+// A small scanner over the text being parsed.
+struct Scanner {
+  std::string_view s;
+  std::size_t i = 0;
+
+  bool AtEnd() const { return i >= s.size(); }
+  char Peek(std::size_t ahead = 0) const { return i + ahead < s.size() ? s[i + ahead] : '\0'; }
+  void SkipBlanks() {
+    while (i < s.size() && (s[i] == ' ' || s[i] == '\t')) ++i;
+  }
+  // Up to `maxDigits` digits; the count read goes to `digits`.
+  bool Number(int& value, int& digits, int maxDigits = 9) {
+    value = 0;
+    digits = 0;
+    while (i < s.size() && IsDigit(s[i]) && digits < maxDigits) {
+      value = value * 10 + (s[i] - '0');
+      ++i;
+      ++digits;
+    }
+    return digits > 0;
+  }
+  std::string_view Word() {
+    const std::size_t from = i;
+    while (i < s.size() && IsAlpha(s[i])) ++i;
+    return s.substr(from, i - from);
+  }
+  bool Accept(char c) {
+    if (Peek() != c) return false;
+    ++i;
+    return true;
+  }
+};
+
+int ExpandYear(int year, int digits) {
+  if (digits > 2) return year;
+  return year < 30 ? 2000 + year : 1900 + year;
+}
+
+bool IsDateSeparator(char c) { return c == '-' || c == '/' || c == '.' || c == ' '; }
+
+// The date part; leaves the scanner after it. `found` is false when the text starts with a time.
+bool ParseDatePart(Scanner& sc, CivilTime& c, bool& found) {
+  found = false;
+  const std::size_t start = sc.i;
+  if (IsAlpha(sc.Peek())) {
+    // "Dec 31 1989", "December 31, 1989"
+    const int month = MonthFromName(sc.Word());
+    if (month == 0) return false;
+    if (!sc.Accept(' ') && !sc.Accept('-')) return false;
+    sc.SkipBlanks();
+    int day = 0, dayDigits = 0, year = 0, yearDigits = 0;
+    if (!sc.Number(day, dayDigits, 2)) return false;
+    sc.Accept(',');
+    if (!sc.Accept(' ') && !sc.Accept('-') && sc.s[sc.i - 1] != ',') return false;
+    sc.SkipBlanks();
+    if (!sc.Number(year, yearDigits, 4)) return false;
+    c.year = ExpandYear(year, yearDigits);
+    c.month = month;
+    c.day = day;
+    found = true;
+    return true;
+  }
+  int first = 0, firstDigits = 0;
+  if (!sc.Number(first, firstDigits, 4)) return false;
+  if (sc.Peek() == ':' && firstDigits <= 2) {
+    sc.i = start;  // a time alone
+    return true;
+  }
+  const char sep = sc.Peek();
+  if (!IsDateSeparator(sep)) return false;
+  ++sc.i;
+  if (sep == ' ') sc.SkipBlanks();
+  if (IsAlpha(sc.Peek())) {
+    // "1-Jan-1900" or "1989 Dec 31"
+    const int month = MonthFromName(sc.Word());
+    if (month == 0) return false;
+    const char sep2 = sc.Peek();
+    if (!IsDateSeparator(sep2)) return false;
+    ++sc.i;
+    if (sep2 == ' ') sc.SkipBlanks();
+    int third = 0, thirdDigits = 0;
+    if (!sc.Number(third, thirdDigits, 4)) return false;
+    c.month = month;
+    if (firstDigits == 4) {
+      c.year = first;
+      c.day = third;
+    } else {
+      c.day = first;
+      c.year = ExpandYear(third, thirdDigits);
+    }
+    found = true;
+    return true;
+  }
+  int second = 0, secondDigits = 0, third = 0, thirdDigits = 0;
+  if (!sc.Number(second, secondDigits, 2)) return false;
+  if (sc.Peek() != sep) return false;
+  ++sc.i;
+  if (!sc.Number(third, thirdDigits, 4)) return false;
+  if (firstDigits == 4) {
+    c.year = first;
+    c.month = second;
+    c.day = third;
+  } else if (firstDigits <= 2) {
+    c.year = ExpandYear(third, thirdDigits);
+    if (first > 12 && second <= 12) {
+      c.day = first;
+      c.month = second;
+    } else {
+      c.month = first;
+      c.day = second;
+    }
+  } else {
+    return false;
+  }
+  found = true;
+  return true;
+}
+
+// The time part with its designator and zone; `offsetMinutes` is the zone's offset from GMT.
+bool ParseTimePart(Scanner& sc, CivilTime& c, int& offsetMinutes) {
+  int hour = 0, hourDigits = 0, minute = 0, minuteDigits = 0, second = 0, secondDigits = 0;
+  if (!sc.Number(hour, hourDigits, 2)) return false;
+  if (!sc.Accept(':')) return false;
+  if (!sc.Number(minute, minuteDigits, 2) || minuteDigits != 2) return false;
+  if (sc.Accept(':')) {
+    if (!sc.Number(second, secondDigits, 2) || secondDigits != 2) return false;
+    if (sc.Accept('.') || sc.Accept(',')) {
+      while (IsDigit(sc.Peek())) ++sc.i;  // fractions of a second are dropped
+    }
+  }
+  sc.SkipBlanks();
+  if (IsAlpha(sc.Peek()) && sc.Peek() != 'Z' && sc.Peek() != 'z') {
+    const std::string_view designator = sc.Word();
+    const bool am = EqualsNoCase(designator, kAmDesignator) || EqualsNoCase(designator, "A");
+    const bool pm = EqualsNoCase(designator, kPmDesignator) || EqualsNoCase(designator, "P");
+    if (!am && !pm) return false;
+    if (hour > 12) return false;
+    if (hour == 12) hour = 0;
+    if (pm) hour += 12;
+    sc.SkipBlanks();
+  }
+  if (sc.Accept('Z') || sc.Accept('z')) {
+    offsetMinutes = 0;
+  } else if (sc.Peek() == '+' || sc.Peek() == '-') {
+    const int sign = sc.Peek() == '-' ? -1 : 1;
+    ++sc.i;
+    int zh = 0, zhDigits = 0, zm = 0, zmDigits = 0;
+    if (!sc.Number(zh, zhDigits, 2) || zhDigits != 2) return false;
+    sc.Accept(':');
+    if (IsDigit(sc.Peek()) && (!sc.Number(zm, zmDigits, 2) || zmDigits != 2)) return false;
+    if (zh > 14 || zm > 59) return false;
+    offsetMinutes = sign * (zh * 60 + zm);
+  }
+  c.hour = hour;
+  c.minute = minute;
+  c.second = second;
+  return true;
+}
+
+void AppendTwo(std::string& out, int v) {
+  out.push_back(static_cast<char>('0' + v / 10));
+  out.push_back(static_cast<char>('0' + v % 10));
+}
+
+void AppendDate(std::string& out, const CivilTime& c) {
+  AppendTwo(out, c.year / 100);
+  AppendTwo(out, c.year % 100);
+  out.push_back('-');
+  AppendTwo(out, c.month);
+  out.push_back('-');
+  AppendTwo(out, c.day);
+}
+
+}  // namespace
+
+TimeSeconds ToSeconds(const CivilTime& c) {
+  const int64_t days = DaysFromCivil(c.year, c.month, c.day) - kEpochDaysFrom1970;
+  return days * kSecondsPerDay + c.hour * 3600 + c.minute * 60 + c.second;
+}
+
+CivilTime ToCivil(TimeSeconds t) {
+  int64_t days = t / kSecondsPerDay;
+  int64_t secs = t % kSecondsPerDay;
+  if (secs < 0) {
+    secs += kSecondsPerDay;
+    --days;
+  }
+  // civil_from_days
+  int64_t z = days + kEpochDaysFrom1970 + 719468;
+  const int64_t era = (z >= 0 ? z : z - 146096) / 146097;
+  const int64_t doe = z - era * 146097;
+  const int64_t yoe = (doe - doe / 1460 + doe / 36524 - doe / 146096) / 365;
+  const int64_t doy = doe - (365 * yoe + yoe / 4 - yoe / 100);
+  const int64_t mp = (5 * doy + 2) / 153;
+  CivilTime c;
+  c.day = static_cast<int>(doy - (153 * mp + 2) / 5 + 1);
+  c.month = static_cast<int>(mp < 10 ? mp + 3 : mp - 9);
+  c.year = static_cast<int>(yoe + era * 400 + (c.month <= 2));
+  c.hour = static_cast<int>(secs / 3600);
+  c.minute = static_cast<int>(secs / 60 % 60);
+  c.second = static_cast<int>(secs % 60);
+  return c;
+}
+
+bool IsValidCivil(const CivilTime& c) {
+  return c.year >= 100 && c.year <= 9999 && c.month >= 1 && c.month <= 12 && c.day >= 1 &&
+         c.day <= DaysInMonth(c.year, c.month) && c.hour >= 0 && c.hour <= 23 && c.minute >= 0 &&
+         c.minute <= 59 && c.second >= 0 && c.second <= 59;
+}
+
+bool InDateRange(TimeSeconds t) { return t >= kMinTime && t <= kMaxTime; }
+
+std::optional<TimeSeconds> ParseDateTime(std::string_view text) {
+  text = Trim(text);
+  if (text.empty()) return std::nullopt;
+  Scanner sc{text};
+  CivilTime c;
+  bool hasDate = false;
+  if (!ParseDatePart(sc, c, hasDate)) return std::nullopt;
+  int offsetMinutes = 0;
+  if (!sc.AtEnd()) {
+    if (hasDate) {
+      if (sc.Peek() == 'T' || sc.Peek() == 't') {
+        ++sc.i;
+      } else if (sc.Peek() == ' ' || sc.Peek() == '\t') {
+        sc.SkipBlanks();
+      } else {
+        return std::nullopt;
+      }
+    }
+    if (!sc.AtEnd() && !ParseTimePart(sc, c, offsetMinutes)) return std::nullopt;
+    sc.SkipBlanks();
+    if (!sc.AtEnd()) return std::nullopt;
+  }
+  if (!IsValidCivil(c)) return std::nullopt;
+  const TimeSeconds t = ToSeconds(c) - offsetMinutes * 60;
+  if (!InDateRange(t)) return std::nullopt;
+  return t;
+}
+
+TimeSeconds ParseDateTimeOrThrow(std::string_view text) {
+  const auto t = ParseDateTime(text);
+  if (!t) throw RuntimeError(kErrTypeMismatch);
+  return *t;
+}
+
+void AppendTimestamp(std::string& out, TimeSeconds t) {
+  const CivilTime c = ToCivil(t);
+  AppendDate(out, c);
+  out.push_back(' ');
+  const int hour12 = c.hour % 12 == 0 ? 12 : c.hour % 12;
+  AppendTwo(out, hour12);
+  out.push_back(':');
+  AppendTwo(out, c.minute);
+  out.push_back(':');
+  AppendTwo(out, c.second);
+  out.push_back(' ');
+  out.append(c.hour < 12 ? kAmDesignator : kPmDesignator);
+}
+
+std::string FormatTimestamp(TimeSeconds t) {
+  std::string out;
+  out.reserve(22);
+  AppendTimestamp(out, t);
+  return out;
+}
+
+void AppendIsoUtc(std::string& out, TimeSeconds t) {
+  const CivilTime c = ToCivil(t);
+  AppendDate(out, c);
+  out.push_back('T');
+  AppendTwo(out, c.hour);
+  out.push_back(':');
+  AppendTwo(out, c.minute);
+  out.push_back(':');
+  AppendTwo(out, c.second);
+  out.push_back('Z');
+}
+
+int64_t SecondsBetween(std::string_view from, std::string_view to) {
+  return ParseDateTimeOrThrow(to) - ParseDateTimeOrThrow(from);
+}
+
+std::string ShiftedTimestamp(std::string_view text, int minutes) {
+  const auto t = ParseDateTime(text);
+  if (!t) return {};
+  const TimeSeconds shifted = *t + static_cast<TimeSeconds>(minutes) * 60;
+  if (!InDateRange(shifted)) return {};
+  return FormatTimestamp(shifted);
+}
+
+std::string OziDateToText(std::string_view field, int gmtMinutes) {
+  field = Trim(field);
+  if (field.empty()) return {};
+  // Whole days before the point, the fraction of a day after it.
+  const auto point = field.find('.');
+  const double days = std::floor(Val(field.substr(0, point)));
+  const double fraction = point == std::string_view::npos ? 0.0 : Val(field.substr(point));
+  const double seconds = std::nearbyint(fraction * kSecondsPerDay);
+  if (!std::isfinite(days) || std::fabs(days) > 4.0e6) return {};
+  const TimeSeconds t = static_cast<TimeSeconds>(days) * kSecondsPerDay +
+                        static_cast<TimeSeconds>(gmtMinutes) * 60 + static_cast<TimeSeconds>(seconds);
+  if (!InDateRange(t)) return {};
+  return FormatTimestamp(t);
+}
+
+std::optional<OziDate> TextToOziDate(std::string_view text, int gmtMinutes) {
+  const auto t = ParseDateTime(text);
+  if (!t) return std::nullopt;
+  const TimeSeconds gmt = *t - static_cast<TimeSeconds>(gmtMinutes) * 60;
+  if (!InDateRange(gmt)) return std::nullopt;
+  OziDate d;
+  d.gmtForm = FormatTimestamp(gmt);
+  static const TimeSeconds k1900 = ToSeconds(CivilTime{1900, 1, 1, 0, 0, 0});
+  const double s = static_cast<double>(gmt - k1900);
+  d.dayNumber = RoundAtDecimals(s / kSecondsPerDay + 2, 6);
+  return d;
+}
+
+int32_t ReadBytesAsLong(std::string_view bytes, long start, int count) {
+  if (start < 1 || count < 1 || count > 4 || static_cast<std::size_t>(start - 1 + count) > bytes.size()) {
+    throw RuntimeError(kErrInvalidCall);
+  }
+  uint32_t value = 0;
+  for (int i = 0; i < count; ++i) {
+    const auto b = static_cast<unsigned char>(bytes[static_cast<std::size_t>(start - 1 + i)]);
+    value |= static_cast<uint32_t>(b) << (8 * i);
+  }
+  return static_cast<int32_t>(value);
+}
+
+float ReadBytesAsSingle(std::string_view bytes, long start) {
+  const uint32_t raw = static_cast<uint32_t>(ReadBytesAsLong(bytes, start, 4));
+  float f = 0;
+  std::memcpy(&f, &raw, sizeof f);
+  return f;
+}
+
+std::string GarminRecordTime(std::string_view record, int gmtMinutes) {
+  static const TimeSeconds kGarminEpoch = ToSeconds(CivilTime{1989, 12, 31, 0, 0, 0});
+  const int32_t s = ReadBytesAsLong(record, 12, 4);
+  const TimeSeconds t = kGarminEpoch + s + static_cast<TimeSeconds>(gmtMinutes) * 60;
+  if (!InDateRange(t)) throw RuntimeError(kErrOverflow);
+  return FormatTimestamp(t);
+}
+
+std::string IsoTimeToTimestamp(std::string_view elementText, int gmtMinutes) {
+  const long t = InStrNoCase(elementText, "T");
+  if (t == 0) return ShiftedTimestamp(elementText, gmtMinutes);
+  const std::string_view date = Left(elementText, t - 1);
+  const std::string_view rest = Mid(elementText, t + 1);
+  const auto z = rest.find('Z');
+  if (z == std::string_view::npos) return ShiftedTimestamp(elementText, gmtMinutes);
+  std::string joined;
+  joined.reserve(date.size() + 1 + z);
+  joined.append(date);
+  joined.push_back(' ');
+  joined.append(rest.substr(0, z));
+  return ShiftedTimestamp(joined, gmtMinutes);
+}
+
+std::string NmeaTimeToTimestamp(std::string_view time, std::string_view date, int gmtMinutes) {
+  if (time.empty()) time = "000000";
+  if (date.empty()) date = "010106";
+  std::string text;
+  text.reserve(20);
+  text.append("20");
+  text.append(Mid(date, 5, 2));
+  text.push_back('-');
+  text.append(Mid(date, 3, 2));
+  text.push_back('-');
+  text.append(Mid(date, 1, 2));
+  text.push_back(' ');
+  text.append(Mid(time, 1, 2));
+  text.push_back(':');
+  text.append(Mid(time, 3, 2));
+  text.push_back(':');
+  text.append(Mid(time, 5, 2));
+  return ShiftedTimestamp(text, gmtMinutes);
+}
+
+int16_t GmtMinutesFromHours(double hours) { return RoundToInt16(hours * 60); }
+
+}  // namespace molvar

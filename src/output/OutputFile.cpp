@@ -1,0 +1,139 @@
+#include "output/OutputFile.h"
+
+#include <cerrno>
+#include <cstring>
+#include <system_error>
+
+#include "core/Errors.h"
+
+#if defined(__unix__) || defined(__APPLE__)
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+#define MOLVAR_POSIX 1
+#endif
+
+namespace molvar {
+namespace {
+
+int ErrorNumberFor(int err) {
+  switch (err) {
+    case ENOENT:
+    case ENOTDIR: return kErrPathNotFound;
+    case ENOSPC:
+#ifdef EDQUOT
+    case EDQUOT:
+#endif
+      return kErrDiskFull;
+    case EACCES:
+    case EPERM:
+    case EROFS: return kErrPermissionDenied;
+    default: return kErrPathFileAccess;
+  }
+}
+
+}  // namespace
+
+void OutputFile::Open(const std::string& path) {
+  Abandon();
+  path_ = path;
+  error_ = 0;
+  buffer_.clear();
+  buffer_.reserve(kFlushSize + 4096);
+  const std::filesystem::path target(path);
+  const std::filesystem::path folder = target.has_parent_path() ? target.parent_path() : std::filesystem::path(".");
+  for (int attempt = 0; attempt < 1000; ++attempt) {
+    temp_ = folder / ("." + target.filename().string() + ".tmp~" + std::to_string(attempt));
+    // "x": never reuse a file another writer has made.
+    file_ = std::fopen(temp_.c_str(), "wbx");
+    if (file_ != nullptr) break;
+    if (errno != EEXIST) Fail(errno);
+  }
+  if (file_ == nullptr) Fail(EEXIST);
+#ifdef MOLVAR_POSIX
+  if (private_) ::fchmod(::fileno(file_), S_IRUSR | S_IWUSR);
+#endif
+}
+
+void OutputFile::EndLine() {
+  buffer_.append("\r\n");
+  FlushIfFull();
+}
+
+void OutputFile::Line(std::string_view text) {
+  buffer_.append(text);
+  EndLine();
+}
+
+void OutputFile::Raw(std::string_view text) {
+  buffer_.append(text);
+  FlushIfFull();
+}
+
+void OutputFile::FlushIfFull() {
+  if (buffer_.size() >= kFlushSize) Flush();
+}
+
+void OutputFile::Flush() {
+  if (file_ == nullptr) {
+    buffer_.clear();
+    return;
+  }
+  if (!buffer_.empty() && error_ == 0) {
+    if (std::fwrite(buffer_.data(), 1, buffer_.size(), file_) != buffer_.size()) error_ = errno != 0 ? errno : EIO;
+  }
+  buffer_.clear();
+}
+
+void OutputFile::Close() {
+  if (file_ == nullptr) throw RuntimeError(kErrBadFileName);
+  Flush();
+  if (error_ == 0 && std::fflush(file_) != 0) error_ = errno != 0 ? errno : EIO;
+#ifdef MOLVAR_POSIX
+  if (error_ == 0 && durable_ && ::fsync(::fileno(file_)) != 0) error_ = errno;
+#endif
+  if (std::fclose(file_) != 0 && error_ == 0) error_ = errno != 0 ? errno : EIO;
+  file_ = nullptr;
+  if (error_ != 0) {
+    const int err = error_;
+    Abandon();
+    Fail(err);
+  }
+  std::error_code ec;
+  std::filesystem::rename(temp_, path_, ec);
+  if (ec) {
+    Abandon();
+    Fail(ec.value());
+  }
+  temp_.clear();
+}
+
+void OutputFile::Abandon() {
+  if (file_ != nullptr) {
+    std::fclose(file_);
+    file_ = nullptr;
+  }
+  if (!temp_.empty()) {
+    std::error_code ec;
+    std::filesystem::remove(temp_, ec);
+    temp_.clear();
+  }
+  buffer_.clear();
+}
+
+void OutputFile::Fail(int err) {
+  const int number = ErrorNumberFor(err);
+  throw RuntimeError(number, RuntimeError::StandardDescription(number) + " (" + path_ + ": " +
+                                 std::strerror(err) + ")");
+}
+
+void WriteFileAtomically(const std::string& path, std::string_view content, bool durable, bool privateFile) {
+  OutputFile f;
+  f.SetDurable(durable);
+  f.SetPrivate(privateFile);
+  f.Open(path);
+  f.Raw(content);
+  f.Close();
+}
+
+}  // namespace molvar
