@@ -56,8 +56,7 @@ std::string_view FolderOf(std::string_view path);
 
 // Fields of a delimited line, numbered from 1. At most kMaxFields are kept; a separator moves to
 // the next field (consecutive separators give empty fields). When `tabJoins` is set, a separator
-// that follows a TAB does not move to the next field (runs of tabs and blanks after a tab count
-// as one separator).
+// right after a TAB does not move to the next field. An empty line has no fields.
 struct Fields {
   static constexpr int kMaxFields = 25;
   std::array<std::string_view, kMaxFields + 1> field{};  // index 0 unused
@@ -65,7 +64,8 @@ struct Fields {
 
   // Field i (1-based); empty when it does not exist.
   std::string_view operator[](int i) const {
-    return (i >= 1 && i <= count) ? field[static_cast<std::size_t>(i)] : std::string_view{};
+    const auto k = static_cast<std::size_t>(i);
+    return (i >= 1 && i <= count && k < field.size()) ? field[k] : std::string_view{};
   }
 };
 Fields SplitFields(std::string_view line, std::string_view separators, bool tabJoins = false);

@@ -4,7 +4,7 @@
 
 namespace molvar {
 
-void TrackStore::Grow(int32_t n) {
+void TrackStore::GrowTrackStore(int32_t n) {
   if (n < 0) throw RuntimeError(kErrSubscript);
   const auto blocksNeeded = static_cast<std::size_t>((static_cast<int64_t>(n) + kBlockSize - 1) >> kBlockShift);
   while (blocks_.size() < blocksNeeded) {
@@ -46,6 +46,11 @@ Waypoint& WaypointStore::at(int32_t i) {
 const Waypoint& WaypointStore::at(int32_t i) const {
   if (i < 1 || i > WptCount) throw RuntimeError(kErrSubscript);
   return items_[static_cast<std::size_t>(i - 1)];
+}
+
+void ClearTrackStore(TrackStore& track, NmeaFix& nmea) {
+  track.Restart();
+  nmea = NmeaFix{};
 }
 
 }  // namespace molvar

@@ -32,7 +32,7 @@ class TrackStore {
 
   // Makes elements 1..n exist: elements up to the old bound keep their values, new ones start as
   // 0 or empty; elements beyond n are dropped.
-  void Grow(int32_t n);
+  void GrowTrackStore(int32_t n);
   // PointCount 0 and a fresh point 1; the other elements stay until they are dropped or regrown.
   void Restart();
 
@@ -118,5 +118,9 @@ struct NmeaFix {
   double NmeaLongitude = 0;
   int32_t NmeaAltitude = 0;
 };
+
+// Empties the track (the arrays keep their contents until overwritten) and forgets the last fix;
+// the GGA altitude text becomes "0".
+void ClearTrackStore(TrackStore& track, NmeaFix& nmea);
 
 }  // namespace molvar
