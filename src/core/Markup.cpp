@@ -53,13 +53,13 @@ bool IsForbiddenControl(unsigned char c) { return c < 0x20 && c != '\t' && c != 
 
 enum class Context { Text, Attribute, Cdata };
 
-std::string Escape(std::string_view text, Context context) {
+std::string Escape(std::string_view text, Context context, MarkupEncoding encoding) {
   std::string out;
   out.reserve(text.size() + 8);
   for (std::size_t i = 0; i < text.size();) {
     const char c = text[i];
     const auto u = static_cast<unsigned char>(c);
-    if (u >= 0x80) {
+    if (u >= 0x80 && encoding == MarkupEncoding::Utf8) {
       const std::size_t n = Utf8SequenceLength(text.substr(i));
       if (n > 0) {
         out.append(text.substr(i, n));
@@ -106,8 +106,14 @@ std::string Escape(std::string_view text, Context context) {
 
 }  // namespace
 
-std::string MarkupText(std::string_view text) { return Escape(text, Context::Text); }
-std::string MarkupAttribute(std::string_view text) { return Escape(text, Context::Attribute); }
-std::string MarkupCdata(std::string_view text) { return Escape(text, Context::Cdata); }
+std::string MarkupText(std::string_view text, MarkupEncoding encoding) {
+  return Escape(text, Context::Text, encoding);
+}
+std::string MarkupAttribute(std::string_view text, MarkupEncoding encoding) {
+  return Escape(text, Context::Attribute, encoding);
+}
+std::string MarkupCdata(std::string_view text, MarkupEncoding encoding) {
+  return Escape(text, Context::Cdata, encoding);
+}
 
 }  // namespace molvar

@@ -8,11 +8,15 @@
 
 namespace molvar {
 
+// The document's declared encoding: in a UTF-8 document a byte that does not begin a UTF-8
+// sequence is taken as Latin-1 and converted; in a Latin-1 document every byte is a character.
+enum class MarkupEncoding { Utf8, Latin1 };
+
 // Element content.
-std::string MarkupText(std::string_view text);
+std::string MarkupText(std::string_view text, MarkupEncoding encoding = MarkupEncoding::Utf8);
 // A double-quoted attribute value.
-std::string MarkupAttribute(std::string_view text);
+std::string MarkupAttribute(std::string_view text, MarkupEncoding encoding = MarkupEncoding::Utf8);
 // The inside of <![CDATA[ ... ]]>.
-std::string MarkupCdata(std::string_view text);
+std::string MarkupCdata(std::string_view text, MarkupEncoding encoding = MarkupEncoding::Utf8);
 
 }  // namespace molvar

@@ -18,6 +18,7 @@ TEST(MarkupText, BytesAndControls) {
   EXPECT_EQ(MarkupText("45\xB0N"), "45\xC2\xB0N");       // Latin-1 degree sign converted
   EXPECT_EQ(MarkupText("caf\xE9"), "caf\xC3\xA9");
   EXPECT_EQ(MarkupText("\xE2\x82"), "\xC3\xA2\xC2\x82");  // truncated sequence
+  EXPECT_EQ(MarkupText("caf\xE9 & \xC2", MarkupEncoding::Latin1), "caf\xE9 &amp; \xC2");
   EXPECT_EQ(MarkupText(std::string("a\0b\x01\x1f\tc\r\n", 9)), "ab\tc\r\n");
 }
 
