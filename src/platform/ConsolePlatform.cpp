@@ -1,0 +1,45 @@
+#include "platform/ConsolePlatform.h"
+
+#include <chrono>
+#include <ctime>
+#include <ostream>
+
+#include "core/DateTime.h"
+#include "core/Errors.h"
+
+namespace molvar {
+
+int ConsolePlatform::MsgBox(std::string_view text, std::string_view title, MsgButtons buttons, MsgIcon) {
+  messages_ << title << ": " << text << '\n';
+  // A "No" never changes an option; an OK lets the job go on as asked on the command line.
+  return buttons == MsgButtons::YesNo ? kAnswerNo : kAnswerOK;
+}
+
+std::string ConsolePlatform::InputBox(std::string_view prompt, std::string_view title, std::string_view defaultText) {
+  messages_ << title << ": " << prompt << " [" << defaultText << "]\n";
+  return std::string(defaultText);
+}
+
+std::optional<std::string> ConsolePlatform::OpenFileDialog(const FileDialogRequest&) { return std::nullopt; }
+std::optional<std::string> ConsolePlatform::SaveFileDialog(const FileDialogRequest&) { return std::nullopt; }
+
+long ConsolePlatform::ShellOpen(std::string_view, std::string_view, std::string_view, std::string_view) {
+  return 0;  // not started
+}
+
+void ConsolePlatform::StartProgram(std::string_view) { throw RuntimeError(kErrFileNotFound); }
+
+uint32_t ConsolePlatform::TickCount() {
+  using namespace std::chrono;
+  return static_cast<uint32_t>(duration_cast<milliseconds>(steady_clock::now().time_since_epoch()).count());
+}
+
+int64_t ConsolePlatform::Now() {
+  const std::time_t now = std::time(nullptr);
+  std::tm local{};
+  localtime_r(&now, &local);
+  return ToSeconds(CivilTime{local.tm_year + 1900, local.tm_mon + 1, local.tm_mday, local.tm_hour, local.tm_min,
+                             local.tm_sec});
+}
+
+}  // namespace molvar

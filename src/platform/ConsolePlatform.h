@@ -1,0 +1,32 @@
+#pragma once
+// The platform of the command line: messages go to stderr as "title: text", questions take the
+// answer that leaves the user's options as they are, and nothing is ever opened or started.
+#include <iosfwd>
+
+#include "platform/Platform.h"
+
+namespace molvar {
+
+class ConsolePlatform : public Platform {
+ public:
+  explicit ConsolePlatform(std::ostream& messages) : messages_(messages) {}
+
+  int MsgBox(std::string_view text, std::string_view title, MsgButtons buttons, MsgIcon icon) override;
+  std::string InputBox(std::string_view prompt, std::string_view title, std::string_view defaultText) override;
+  std::optional<std::string> OpenFileDialog(const FileDialogRequest& request) override;
+  std::optional<std::string> SaveFileDialog(const FileDialogRequest& request) override;
+  long ShellOpen(std::string_view verb, std::string_view target, std::string_view parameters,
+                 std::string_view folder) override;
+  void StartProgram(std::string_view commandLine) override;
+  bool InternetAvailable() override { return false; }
+  void SetTopMost(WindowId, bool) override {}
+  void Beep(int, int) override {}
+  uint32_t TickCount() override;
+  void ProcessEvents() override {}
+  int64_t Now() override;
+
+ private:
+  std::ostream& messages_;
+};
+
+}  // namespace molvar
