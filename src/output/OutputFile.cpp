@@ -106,6 +106,7 @@ void OutputFile::Close() {
     Fail(ec.value());
   }
   temp_.clear();
+  ++completed_;
 }
 
 void OutputFile::Abandon() {

@@ -34,6 +34,8 @@ class OutputFile {
   // Writes what is left and puts the file in place of the target. Raises RuntimeError (and
   // leaves the target untouched) when any write failed.
   void Close();
+  // How many files were put in place so far.
+  int CompletedCount() const { return completed_; }
   // Drops the temporary file; the target is untouched.
   void Abandon();
 
@@ -56,6 +58,7 @@ class OutputFile {
   int error_ = 0;
   bool durable_ = false;
   bool private_ = false;
+  int completed_ = 0;
 };
 
 // Whole-file writes through OutputFile: `content` already holds its line ends.

@@ -20,8 +20,15 @@ std::string ConsolePlatform::InputBox(std::string_view prompt, std::string_view 
   return std::string(defaultText);
 }
 
-std::optional<std::string> ConsolePlatform::OpenFileDialog(const FileDialogRequest&) { return std::nullopt; }
-std::optional<std::string> ConsolePlatform::SaveFileDialog(const FileDialogRequest&) { return std::nullopt; }
+std::optional<std::string> ConsolePlatform::OpenFileDialog(const FileDialogRequest&) { return NextPath(); }
+std::optional<std::string> ConsolePlatform::SaveFileDialog(const FileDialogRequest&) { return NextPath(); }
+
+std::optional<std::string> ConsolePlatform::NextPath() {
+  if (dialogPaths.empty()) return std::nullopt;
+  std::string path = std::move(dialogPaths.front());
+  dialogPaths.pop_front();
+  return path;
+}
 
 long ConsolePlatform::ShellOpen(std::string_view, std::string_view, std::string_view, std::string_view) {
   return 0;  // not started

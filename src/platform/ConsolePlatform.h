@@ -1,7 +1,9 @@
 #pragma once
 // The platform of the command line: messages go to stderr as "title: text", questions take the
 // answer that leaves the user's options as they are, and nothing is ever opened or started.
+#include <deque>
 #include <iosfwd>
+#include <string>
 
 #include "platform/Platform.h"
 
@@ -10,6 +12,9 @@ namespace molvar {
 class ConsolePlatform : public Platform {
  public:
   explicit ConsolePlatform(std::ostream& messages) : messages_(messages) {}
+
+  // The files the open and save dialogs "choose", in order; a dialog with none left is cancelled.
+  std::deque<std::string> dialogPaths;
 
   int MsgBox(std::string_view text, std::string_view title, MsgButtons buttons, MsgIcon icon) override;
   std::string InputBox(std::string_view prompt, std::string_view title, std::string_view defaultText) override;
@@ -26,6 +31,7 @@ class ConsolePlatform : public Platform {
   int64_t Now() override;
 
  private:
+  std::optional<std::string> NextPath();
   std::ostream& messages_;
 };
 
