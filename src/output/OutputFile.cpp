@@ -32,6 +32,25 @@ int ErrorNumberFor(int err) {
   }
 }
 
+// Never reuses a file another writer has made; a private file is never readable by others, not
+// even for a moment.
+std::FILE* CreateNew(const std::filesystem::path& path, bool privateFile) {
+#ifdef MOLVAR_POSIX
+  const int fd = ::open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, privateFile ? 0600 : 0666);
+  if (fd < 0) return nullptr;
+  std::FILE* f = ::fdopen(fd, "wb");
+  if (f == nullptr) {
+    const int err = errno;
+    ::close(fd);
+    errno = err;
+  }
+  return f;
+#else
+  (void)privateFile;
+  return std::fopen(path.string().c_str(), "wbx");
+#endif
+}
+
 }  // namespace
 
 void OutputFile::Open(const std::string& path) {
@@ -43,16 +62,14 @@ void OutputFile::Open(const std::string& path) {
   const std::filesystem::path target(path);
   const std::filesystem::path folder = target.has_parent_path() ? target.parent_path() : std::filesystem::path(".");
   for (int attempt = 0; attempt < 1000; ++attempt) {
-    temp_ = folder / ("." + target.filename().string() + ".tmp~" + std::to_string(attempt));
-    // "x": never reuse a file another writer has made.
-    file_ = std::fopen(temp_.c_str(), "wbx");
+    std::string name(".");
+    name.append(target.filename().string()).append(".tmp~").append(std::to_string(attempt));
+    temp_ = folder / name;
+    file_ = CreateNew(temp_, private_);
     if (file_ != nullptr) break;
     if (errno != EEXIST) Fail(errno);
   }
   if (file_ == nullptr) Fail(EEXIST);
-#ifdef MOLVAR_POSIX
-  if (private_) ::fchmod(::fileno(file_), S_IRUSR | S_IWUSR);
-#endif
 }
 
 void OutputFile::EndLine() {
