@@ -1,6 +1,7 @@
 #include "app/Settings.h"
 
 #include <array>
+#include <initializer_list>
 #include <cerrno>
 #include <cstdio>
 #include <memory>
@@ -352,30 +353,31 @@ std::string SettingText(Molvar& m, int k) {
   }
 }
 
+std::string JoinCrLf(std::initializer_list<std::string_view> lines) {
+  std::string text;
+  for (std::string_view l : lines) {
+    if (!text.empty()) text += kCrLf;
+    text += l;
+  }
+  return text;
+}
+
 void ShowWelcome(Molvar& m) {
-  std::string text = "Please read the help file before you use the program.";
-  text += kCrLf;
-  text += "(The help file is web-based and is under the \"Help\" menu.)";
-  text += kCrLf;
-  text += "Also, positioning the cursor over any control will pop up a help box.";
-  text += kCrLf;
-  text += "If there's something you still can't figure out, email me.";
-  text += kCrLf;
-  text += " (there is an email link in the help file)";
-  m.platform.MsgBox(text, " Welcome to Molvar...", MsgButtons::OK, MsgIcon::Information);
+  m.platform.MsgBox(JoinCrLf({"Please read the help file before you use the program.",
+                              "(The help file is web-based and is under the \"Help\" menu.)",
+                              "Also, positioning the cursor over any control will pop up a help box.",
+                              "If there's something you still can't figure out, email me.",
+                              " (there is an email link in the help file)"}),
+                    " Welcome to Molvar...", MsgButtons::OK, MsgIcon::Information);
 }
 
 void ShowIniError(Molvar& m, int number) {
-  std::string text = "Ini file contains errors.";
-  text += kCrLf;
-  text += "Error number: " + IntToText(number);
-  text += kCrLf;
-  text += "It should fix itself next time you run the program.";
-  text += kCrLf;
-  text += "If not, look at the ini file for any pathname errors.";
-  text += kCrLf;
-  text += " If that doesn't work, send me an email.";
-  m.platform.MsgBox(text, " No big deal, but...", MsgButtons::OK, MsgIcon::Information);
+  const std::string numberLine = "Error number: " + IntToText(number);
+  m.platform.MsgBox(JoinCrLf({"Ini file contains errors.", numberLine,
+                              "It should fix itself next time you run the program.",
+                              "If not, look at the ini file for any pathname errors.",
+                              " If that doesn't work, send me an email."}),
+                    " No big deal, but...", MsgButtons::OK, MsgIcon::Information);
 }
 
 // Reads Molvar.ini over the defaults; reports a missing or faulty file.

@@ -5,6 +5,7 @@
 
 #include <filesystem>
 #include <string>
+#include <tuple>
 #include <vector>
 
 #include "app/Options.h"
@@ -536,6 +537,84 @@ TEST(LoadSettings, RestoresTheLastTrack) {
   EXPECT_TRUE(t.platform.Messages().empty());
   EXPECT_EQ(t->Track.PointCount, 3);
   EXPECT_EQ(t->frmMain.txtInfo.Text, " Last saved track file was day one.kml, with 3 points.");
+}
+
+TEST(Options, UnitChoicesSetFactorsAndLabels) {
+  TestProgram t;
+  SelectSpeedUnits(*t, 2);
+  EXPECT_EQ(t->UnitFactor, 0.5399568);
+  EXPECT_EQ(t->SpeedUnitLabel, " kts");
+  EXPECT_EQ(t->DistanceUnitLabel, " nm");
+  EXPECT_TRUE(t->frmMain.mnuUnitsItem(2).Checked);
+  EXPECT_FALSE(t->frmMain.mnuUnitsItem(0).Checked);
+  SelectSpeedUnits(*t, 0);
+  EXPECT_EQ(t->UnitFactor, 1.0);
+  EXPECT_EQ(t->SpeedUnitLabel, " kph");
+  SelectAltitudeUnits(*t, 1);
+  SelectAltitudeUnits(*t, 0);
+  EXPECT_EQ(t->AltitudeFactor, 3.28083);
+  EXPECT_EQ(t->AltitudeUnitLabel, " feet");
+  EXPECT_EQ(t->frmMain.Label2.Caption, "Feet");
+}
+
+TEST(Options, GmtTextGivesHoursAndMinutes) {
+  TestProgram t;
+  for (const auto& [text, hours, minutes] :
+       std::vector<std::tuple<std::string, double, int>>{{"5.75", 5.75, 345}, {"-3.5h", -3.5, -210},
+                                                         {"east", 0, 0}, {"", 0, 0}, {"1e9", 0, 0}}) {
+    SCOPED_TRACE(text);
+    t->frmMain.txtGMT.Text = text;
+    ApplyGmtText(*t);
+    EXPECT_EQ(t->GmtHours, hours);
+    EXPECT_EQ(t->GmtMinutes, minutes);
+  }
+  EXPECT_TRUE(t.platform.Messages().empty());
+}
+
+TEST(Options, GoogleMapsOutputCollapsesSegments) {
+  TestProgram t;
+  t->frmMain.chkSplitIfStopped.Value = 1;
+  ApplySplitIfStopped(*t);
+  SelectOutputMode(*t, 1);
+  EXPECT_EQ(t->frmMain.chkCollapse.Value, 1);
+  EXPECT_EQ(t->CollapseSegments, 1);
+  EXPECT_EQ(t->frmMain.chkSplitIfStopped.Value, 0);
+  EXPECT_EQ(t->SplitIfStopped, 0);
+  EXPECT_EQ(t->frmMain.cmdOpen.ToolTipText, " FTP file to server for GoogleMaps (see help) ");
+  SelectOutputMode(*t, 0);
+  EXPECT_EQ(t->frmMain.cmdOpen.Caption, "Open in GE");
+  EXPECT_EQ(t->frmMain.cmdOpen.ToolTipText, " Open last output file in GoogleEarth ");
+  EXPECT_EQ(t->frmMain.chkCollapse.Value, 1);  // stays checked
+  EXPECT_TRUE(t->frmMain.chkDetailed.Enabled);
+}
+
+TEST(Options, WaypointChoicesKeepTheirRules) {
+  TestProgram t;
+  t->ProgramMode = kModeConvertWaypoints;
+  SelectAltitudeMode(*t, 3);  // speed as altitude means nothing for waypoints
+  EXPECT_EQ(t->AltitudeMode, 2);
+  EXPECT_EQ(t->frmMain.comboAltitude.ListIndex, 2);
+  EXPECT_TRUE(t->frmMain.AltLabel.Visible);
+  EXPECT_FALSE(t->frmMain.sldrGain.Enabled);
+
+  SelectWptFileType(*t, 1);
+  SelectWptTitle(*t, 2);
+  SelectWptFileType(*t, 0);  // OziExplorer files have no description
+  EXPECT_FALSE(t->frmMain.optWptTitle(2).Enabled);
+  EXPECT_TRUE(t->frmMain.optWptTitle(1).Value);
+  EXPECT_EQ(t->PlacemarkLabelSource, 1);
+}
+
+TEST(LoadSettings, StoredWaypointModeRefusesSpeedAsAltitude) {
+  TestProgram t;
+  auto lines = LinesOf(Golden("defaults.ini"));
+  lines[11] = SettingsLabel(11) + "3";
+  lines[24] = SettingsLabel(24) + "1";
+  WriteFile(t.folder.File("Molvar.ini"), JoinLines(lines));
+  LoadSettings(*t);
+  EXPECT_EQ(t->ProgramMode, 1);
+  EXPECT_EQ(t->AltitudeMode, 2);
+  EXPECT_EQ(t->frmMain.comboAltitude.Text(), " Extrude track to ground");
 }
 
 }  // namespace
