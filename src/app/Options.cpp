@@ -102,6 +102,20 @@ void ApplyCollapse(Molvar& m) {
   }
 }
 
+void ApplySplitColor(Molvar& m, int index) {
+  auto& boxes = m.frmMain.chkSplitColor;
+  if (!boxes.Has(index)) return;
+  if (boxes(index).Checked()) {
+    for (auto& [i, box] : boxes.Items()) {
+      if (i != index) box.Value = 0;
+    }
+  }
+  m.ColorVaryMode = 0;
+  for (const auto& [i, box] : boxes.Items()) {
+    if (box.Checked()) m.ColorVaryMode = static_cast<int16_t>(i + 1);
+  }
+}
+
 void ApplySplitIfStopped(Molvar& m) { m.SplitIfStopped = static_cast<int16_t>(m.frmMain.chkSplitIfStopped.Value); }
 
 void ApplyDetailed(Molvar& m) {

@@ -25,6 +25,9 @@ void SelectOutputMode(Molvar& m, int index);
 void CheckProgramModeItem(Molvar& m, int index);
 
 // Check box effects, run after the box's value changed.
+// The three colour choices exclude each other: a checked one clears the other two; ColorVaryMode
+// follows (1 by segment, 2 by date, 3 by speed, 0 none).
+void ApplySplitColor(Molvar& m, int index);
 void ApplyCollapse(Molvar& m);
 void ApplySplitIfStopped(Molvar& m);
 void ApplyDetailed(Molvar& m);

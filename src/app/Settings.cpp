@@ -104,12 +104,18 @@ void StoreIndex(int16_t v, int lo, int hi, int16_t& target) {
 
 // A check box line: 0 or 1 is restored (anything else leaves the default) and the box's own
 // handler runs when the value changed, as a click would.
-void StoreCheck(Molvar& m, double v, CheckBox& box, void (*onClick)(Molvar&) = nullptr) {
-  if (v != 0 && v != 1) return;
+// Returns whether the value changed.
+bool StoreCheck(Molvar& m, double v, CheckBox& box, void (*onClick)(Molvar&) = nullptr) {
+  if (v != 0 && v != 1) return false;
   const int value = v == 1 ? 1 : 0;
-  if (box.Value == value) return;
+  if (box.Value == value) return false;
   box.Value = value;
   if (onClick) onClick(m);
+  return true;
+}
+
+void StoreSplitColor(Molvar& m, double v, int index) {
+  if (StoreCheck(m, v, m.frmMain.chkSplitColor(index))) ApplySplitColor(m, index);
 }
 
 std::string_view BoolText(bool b) { return b ? "True" : "False"; }
@@ -139,6 +145,7 @@ void ApplySettingDefaults(Molvar& m) {
   f.chkSplitColor(0).Value = 0;
   f.chkSplitColor(1).Value = 0;
   f.chkSplitColor(2).Value = 0;
+  m.ColorVaryMode = 0;
   m.UserColorPointer = 0;
   f.txtTitle.Text.clear();
   m.AltitudeMode = 0;
@@ -214,8 +221,8 @@ void StoreSetting(Molvar& m, int k, std::string_view v) {
     case 4: m.OutputPlacemarkPath = text; break;
     case 5: m.TextEditorPath = text; break;
     case 6: m.GoogleEarthPath = text; break;
-    case 7: StoreCheck(m, ReadInt(v), f.chkSplitColor(0)); break;
-    case 8: StoreCheck(m, ReadInt(v), f.chkSplitColor(1)); break;
+    case 7: StoreSplitColor(m, ReadInt(v), 0); break;
+    case 8: StoreSplitColor(m, ReadInt(v), 1); break;
     case 9: StoreIndex(ReadInt(v), 0, 9, m.UserColorPointer); break;
     case 10: f.txtTitle.Text = text; break;
     case 11: StoreIndex(ReadInt(v), 0, 3, m.AltitudeMode); break;
@@ -273,7 +280,7 @@ void StoreSetting(Molvar& m, int k, std::string_view v) {
     case 60: StoreCheck(m, Val(v), f.chkMoreInfo); break;
     case 61: StoreCheck(m, Val(v), f.chkPort(0)); break;
     case 62: StoreCheck(m, Val(v), f.chkPort(1)); break;
-    case 63: StoreCheck(m, Val(v), f.chkSplitColor(2)); break;
+    case 63: StoreSplitColor(m, Val(v), 2); break;
     case 64: StoreCheck(m, Val(v), f.chkGPGGA); break;
     default: break;
   }

@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 #include <sys/stat.h>
 
+#include <array>
 #include <filesystem>
 #include <string>
 #include <tuple>
@@ -95,8 +96,9 @@ TEST(LoadSettings, EveryValueChangedIsRestoredAndWrittenBackUnchanged) {
   EXPECT_EQ(m.OutputPlacemarkPath, "/home/ham/placemarks");
   EXPECT_EQ(m.TextEditorPath, "/usr/bin/gedit");
   EXPECT_EQ(m.GoogleEarthPath, "/usr/local/bin/google-earth");
-  EXPECT_EQ(f.chkSplitColor(0).Value, 1);
+  EXPECT_EQ(f.chkSplitColor(0).Value, 0);  // the colour choices exclude each other
   EXPECT_EQ(f.chkSplitColor(1).Value, 1);
+  EXPECT_EQ(m.ColorVaryMode, 2);
   EXPECT_EQ(m.UserColorPointer, 7);
   EXPECT_EQ(f.ColorSample.BackColor, m.DisplayColorTable[7]);
   EXPECT_EQ(f.txtTitle.Text, "Trip = fun");
@@ -183,7 +185,7 @@ TEST(LoadSettings, EveryValueChangedIsRestoredAndWrittenBackUnchanged) {
   EXPECT_EQ(f.chkMoreInfo.Value, 1);
   EXPECT_EQ(f.chkPort(0).Value, 1);
   EXPECT_EQ(f.chkPort(1).Value, 1);
-  EXPECT_EQ(f.chkSplitColor(2).Value, 1);
+  EXPECT_EQ(f.chkSplitColor(2).Value, 0);
   EXPECT_EQ(f.chkGPGGA.Value, 1);
 
   // Every line goes back out exactly as it came in.
@@ -603,6 +605,30 @@ TEST(Options, WaypointChoicesKeepTheirRules) {
   EXPECT_FALSE(t->frmMain.optWptTitle(2).Enabled);
   EXPECT_TRUE(t->frmMain.optWptTitle(1).Value);
   EXPECT_EQ(t->PlacemarkLabelSource, 1);
+}
+
+TEST(LoadSettings, ColourChoicesExcludeEachOther) {
+  struct Case {
+    const char* seg;
+    const char* date;
+    const char* speed;
+    int mode;
+    std::array<int, 3> boxes;
+  };
+  for (const Case c : {Case{"1", "0", "0", 1, {1, 0, 0}}, Case{"1", "1", "0", 2, {0, 1, 0}},
+                       Case{"1", "1", "1", 3, {0, 0, 1}}, Case{"0", "0", "1x", 3, {0, 0, 1}},
+                       Case{"0", "0", "0", 0, {0, 0, 0}}}) {
+    SCOPED_TRACE(std::string(c.seg) + c.date + c.speed);
+    TestProgram t;
+    auto lines = LinesOf(Golden("defaults.ini"));
+    lines[7] = SettingsLabel(7) + c.seg;
+    lines[8] = SettingsLabel(8) + c.date;
+    lines[63] = SettingsLabel(63) + c.speed;
+    WriteFile(t.folder.File("Molvar.ini"), JoinLines(lines));
+    LoadSettings(*t);
+    EXPECT_EQ(t->ColorVaryMode, c.mode);
+    for (int i = 0; i < 3; ++i) EXPECT_EQ(t->frmMain.chkSplitColor(i).Value, c.boxes[static_cast<std::size_t>(i)]);
+  }
 }
 
 TEST(LoadSettings, StoredWaypointModeRefusesSpeedAsAltitude) {
