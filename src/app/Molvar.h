@@ -4,6 +4,7 @@
 // fresh one with a scripted platform.
 #include <array>
 #include <cstdint>
+#include <fstream>
 #include <string>
 
 #include "app/Form.h"
@@ -112,6 +113,8 @@ struct Molvar {
 
   // The one output file of the writers
   OutputFile Out;
+  // agwpe.txt in the program folder, emptied at start and open until shutdown
+  std::ofstream AgwpeFile;
 
   // Module state
   SpeedState Speed;
