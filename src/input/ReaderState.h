@@ -27,6 +27,8 @@ struct MarkupReaderState {
 struct NmeaParserState {
   int16_t LastFixQuality = 0;
   int32_t PreviousAltitude = 0;
+  // Set by the APRS web lookup while it reads a track page: each accepted sentence becomes a point.
+  int16_t AprsWebAddsPoints = 0;
 };
 
 }  // namespace molvar
