@@ -1,0 +1,77 @@
+#include "output/Dispatch.h"
+
+#include "app/Molvar.h"
+
+namespace molvar {
+namespace {
+
+// Each failed start asks for the program again; a cancel ends it. The loop replaces the
+// recursion between the two procedures so a long series of wrong choices cannot exhaust the stack.
+bool StartGoogleEarth(Molvar& m, const std::string& file) {
+  try {
+    m.platform.StartProgram(m.GoogleEarthPath + " \"" + file + "\"");
+    return true;
+  } catch (const std::exception&) {
+    m.platform.MsgBox(
+        "GoogleEarth not found. Close this window. In the file dialog box that opens, find Google Earth and open "
+        "it.\r\nThe location will be saved for the next time.",
+        " Whoops!...", MsgButtons::OK, MsgIcon::Information);
+    return false;
+  }
+}
+
+bool AskGoogleEarthPath(Molvar& m) {
+  FileDialogRequest request;
+  request.title = "Locate Google Earth";
+  request.filter = "GE executable (*.exe)|*.exe";
+  request.initialFolder = std::string(m.GoogleEarthPath.substr(0, m.GoogleEarthPath.find_last_of('/') == std::string::npos ? 0 : m.GoogleEarthPath.find_last_of('/')));
+  request.proposedName = m.GoogleEarthPath;
+  const auto chosen = m.platform.OpenFileDialog(request);
+  if (!chosen || chosen->empty()) return false;
+  m.GoogleEarthPath = *chosen;
+  return true;
+}
+
+void OpenInGoogleEarth(Molvar& m, bool retrying) {
+  const std::string file = m.ProgramMode == kModeRealTimeNmea ? m.ProgramPath("gps.kml") : m.OutputPath;
+  if (retrying && !AskGoogleEarthPath(m)) return;
+  while (!StartGoogleEarth(m, file)) {
+    if (!AskGoogleEarthPath(m)) return;
+  }
+  if (m.ProgramMode == kModeAgw) {
+    // Lets Google Earth come up before the engine's next burst; no events run meanwhile.
+    const uint32_t start = m.platform.TickCount();
+    while (m.platform.TickCount() - start < 2000) {
+    }
+  }
+}
+
+}  // namespace
+
+void OpenOutput(Molvar& m) {
+  if (m.OutputPath.empty()) {
+    m.platform.MsgBox("You must create a file first before you can open it.", " Whoopsie!...", MsgButtons::OK,
+                      MsgIcon::Information);
+    return;
+  }
+  if (m.OutputMode == kOutputGoogleEarth) {
+    if (m.OutputFormat != kFormatKml) {
+      m.platform.MsgBox("File " + m.OutputName + " cannot  be opened in Google Earth.", " Whoopsie!...",
+                        MsgButtons::OK, MsgIcon::Information);
+      return;
+    }
+    OpenInGoogleEarth(m, false);
+    return;
+  }
+  if (m.OutputFormat != kFormatKml) {
+    m.platform.MsgBox("File " + m.OutputName + " cannot  be opened in Google Map.", " Whoopsie!...", MsgButtons::OK,
+                      MsgIcon::Information);
+    return;
+  }
+  // The upload (FtpReady) and the FTP setup window belong to the FTP module, which hooks in here.
+  if (m.FtpReady == 0) m.frmFtpSetup.window.Visible = true;
+}
+
+void LocateGoogleEarth(Molvar& m) { OpenInGoogleEarth(m, true); }
+
+}  // namespace molvar
