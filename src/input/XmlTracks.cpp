@@ -1,0 +1,238 @@
+#include "input/XmlTracks.h"
+
+#include <vector>
+
+#include "app/Molvar.h"
+#include "core/DateTime.h"
+#include "core/Numbers.h"
+#include "core/SpeedDistance.h"
+#include "core/Text.h"
+#include "input/ReaderCommon.h"
+
+namespace molvar {
+
+namespace {
+
+struct ValueTag {
+  std::string_view open;   // searched in the lower-cased line
+  std::string_view close;  // closing mark of the value; empty for an attribute
+};
+
+struct MarkupVocabulary {
+  const char* procedure;
+  std::string_view segment;
+  std::string_view trackStart;
+  std::string_view trackEnd;
+  std::string_view waypointStart;
+  std::string_view waypointEnd;
+  ValueTag lat, lon, ele, name, cmt, desc, time;
+};
+
+constexpr MarkupVocabulary kGpx{
+    "ReadGpxLine", "<trkseg>", "<trkpt", "</trkpt>", "<wpt", "</wpt>",
+    {"lat=", {}}, {"lon=", {}}, {"<ele>", "</ele>"}, {"<name>", "</name>"},
+    {"<cmt>", "</cmt>"}, {"<desc>", "</desc>"}, {"<time>", "</time>"}};
+
+constexpr MarkupVocabulary kXml{
+    "ReadXmlLine", "<track>", "<trackpoint>", "</trackpoint>", "<waypoint", "</waypoint>",
+    {"<latitude>", "</latitude>"}, {"<longitude>", "</longitude>"},
+    {"<altitude>", "</altitude>"}, {"<name>", "</name>"}, {"<comment>", "</comment>"},
+    {"<description>", "</description>"}, {"<time>", "</time>"}};
+
+// The value of `tag` on the line, cut before its closing mark (the rest of the line when the
+// mark is not on it); false when the tag is absent.
+bool TagValue(std::string_view line, std::string_view lower, const ValueTag& tag,
+              std::string& value) {
+  const long p = InStr(lower, tag.open);
+  if (p == 0) return false;
+  const long start = p + static_cast<long>(tag.open.size());
+  std::string_view v;
+  if (tag.close.empty()) {
+    // Attribute: the quote after "=" is skipped and the value ends at the matching quote.
+    const std::string_view quote = Mid(line, start, 1) == "'" ? "'" : "\"";
+    v = Mid(line, start + 1);
+    const long end = InStr(v, quote);
+    if (end > 0) v = Left(v, end - 1);
+  } else {
+    v = Mid(line, start);
+    const long end = InStrNoCase(v, tag.close);
+    if (end > 0) v = Left(v, end - 1);
+  }
+  value.assign(v);
+  return true;
+}
+
+// The whole text as a rounded whole number; 0 when it is not a number or out of range.
+int32_t WholeNumberOr0(std::string_view text) {
+  double v = 0;
+  return TryParseNumber(text, v) ? RoundToInt32Or(v, 0) : 0;
+}
+
+void StoreTrackPoint(Molvar& m, MarkupReaderState& s) {
+  TrackPoint& p = AppendTrackPoint(m);
+  p.Flag = s.NewSegment ? 1 : 0;
+  p.Latitude = Val(s.lat);
+  p.Longitude = Val(s.lon);
+  if (!s.time.empty()) p.DateTime = IsoTimeToTimestamp(s.time, m.GmtMinutes);
+  p.Altitude = WholeNumberOr0(s.ele.empty() ? std::string_view("0") : std::string_view(s.ele));
+  CalcSpeedDistance(m, m.Track.PointCount);
+  if (m.ColorVaryMode == 3) AssignSpeedBand(m, m.Track.PointCount);
+}
+
+void StoreWaypoint(Molvar& m, MarkupReaderState& s) {
+  Waypoint& w = m.Waypoints.Add();
+  std::string* label = &s.name;
+  if (m.PlacemarkLabelSource == 1) label = &s.cmt;
+  if (m.PlacemarkLabelSource == 2) label = &s.desc;
+  *label = StripCdata(*label);
+  w.WptLatitude = Val(s.lat);
+  w.WptLongitude = Val(s.lon);
+  w.WptAltitude = RoundToInt32Or(Val(s.ele), 0);
+  w.WptName = s.name;
+  w.WptComment = s.cmt;
+  w.WptDescription = s.desc;
+  std::string& text = m.PlacemarkLabelSource == 1   ? w.WptComment
+                      : m.PlacemarkLabelSource == 2 ? w.WptDescription
+                                                    : w.WptName;
+  WriteWaypointPlacemark(m, text, w.WptLongitude, w.WptLatitude, w.WptAltitude);
+}
+
+void ReadMarkupLine(Molvar& m, MarkupReaderState& s, const MarkupVocabulary& tags,
+                    std::string_view line) {
+  if (line.empty()) return;
+  try {
+    const bool waypoints = m.ProgramMode == kModeConvertWaypoints;
+    const std::string lower = LCase(line);
+    if (!waypoints && Contains(lower, tags.segment)) s.NewSegment = true;
+    if (Contains(lower, waypoints ? tags.waypointStart : tags.trackStart)) s.InPoint = true;
+    if (s.InPoint) {
+      TagValue(line, lower, tags.lat, s.lat);
+      TagValue(line, lower, tags.lon, s.lon);
+      TagValue(line, lower, tags.ele, s.ele);
+      TagValue(line, lower, tags.name, s.name);
+      TagValue(line, lower, tags.cmt, s.cmt);
+      TagValue(line, lower, tags.desc, s.desc);
+      TagValue(line, lower, tags.time, s.time);
+    }
+    if (Contains(lower, waypoints ? tags.waypointEnd : tags.trackEnd)) s.EndPoint = true;
+    if (!s.EndPoint) return;
+    // An end tag without its start tag ends nothing.
+    if (s.InPoint) {
+      if (waypoints) {
+        StoreWaypoint(m, s);
+      } else {
+        StoreTrackPoint(m, s);
+      }
+    }
+    s.Reset();
+  } catch (const std::exception& e) {
+    s.Reset();
+    ShowSnag(m, tags.procedure, e);
+  }
+}
+
+bool IsWhite(char c) { return c == ' ' || c == '\t' || c == '\r' || c == '\n'; }
+
+bool HasValue(std::string_view s) {
+  for (const char c : s) {
+    if (!IsWhite(c)) return true;
+  }
+  return false;
+}
+
+std::string_view TrimWhite(std::string_view s) {
+  while (!s.empty() && IsWhite(s.front())) s.remove_prefix(1);
+  while (!s.empty() && IsWhite(s.back())) s.remove_suffix(1);
+  return s;
+}
+
+void StoreKmlTuple(Molvar& m, std::string_view lon, std::string_view lat, std::string_view alt,
+                   bool lastOfLine) {
+  double longitude = 0;
+  double latitude = 0;
+  // Only tuples with a real position become points.
+  if (!TryParseNumber(TrimWhite(lon), longitude) || !TryParseNumber(TrimWhite(lat), latitude)) {
+    return;
+  }
+  TrackPoint& p = AppendTrackPoint(m);
+  p.Longitude = longitude;
+  p.Latitude = latitude;
+  p.Altitude = WholeNumberOr0(TrimWhite(alt));
+  CalcSpeedDistance(m, m.Track.PointCount);
+  // The driver bands the last point a line adds; the others are banded here.
+  if (!lastOfLine && m.ColorVaryMode == 3) AssignSpeedBand(m, m.Track.PointCount);
+}
+
+}  // namespace
+
+void ReadGpxLine(Molvar& m, std::string_view line) { ReadMarkupLine(m, m.GpxReader, kGpx, line); }
+
+void ReadXmlLine(Molvar& m, std::string_view line) { ReadMarkupLine(m, m.XmlReader, kXml, line); }
+
+void ReadKmlCoordinateLine(Molvar& m, std::string_view line) {
+  if (line.empty() || Contains(line, "<")) return;
+  try {
+    struct Tuple {
+      std::string_view field[3];
+    };
+    std::vector<Tuple> tuples;
+    Tuple current;
+    int index = 0;  // field being collected
+    std::size_t fieldStart = 0;
+    bool any = false;  // the tuple holds a character other than white space
+    auto closeField = [&](std::size_t end) {
+      current.field[index] = line.substr(fieldStart, end - fieldStart);
+    };
+    auto closeTuple = [&](std::size_t end) {
+      closeField(end);
+      if (any) tuples.push_back(current);
+      current = Tuple{};
+      index = 0;
+      any = false;
+    };
+    for (std::size_t i = 0; i < line.size(); ++i) {
+      const char c = line[i];
+      if (c == ',') {
+        if (index == 2) {
+          closeTuple(i);
+        } else {
+          closeField(i);
+          ++index;
+        }
+        fieldStart = i + 1;
+      } else if (IsWhite(c)) {
+        // White space after a value starts the next tuple, unless a comma follows it (blanks
+        // around commas inside one tuple).
+        std::size_t next = i;
+        while (next < line.size() && IsWhite(line[next])) ++next;
+        if (HasValue(line.substr(fieldStart, i - fieldStart)) && next < line.size() &&
+            line[next] != ',') {
+          closeTuple(i);
+          fieldStart = next;
+          i = next - 1;
+        }
+      } else {
+        any = true;
+      }
+    }
+    closeTuple(line.size());
+    for (std::size_t t = 0; t < tuples.size(); ++t) {
+      const Tuple& tu = tuples[t];
+      StoreKmlTuple(m, tu.field[0], tu.field[1], tu.field[2], t + 1 == tuples.size());
+    }
+  } catch (const std::exception& e) {
+    ShowSnag(m, "ReadKmlCoordinateLine", e);
+  }
+}
+
+std::string StripCdata(std::string_view text) {
+  constexpr std::string_view kOpen = "<![CDATA[";
+  const long p = InStr(UCase(text), kOpen);
+  if (p == 0) return std::string(text);
+  std::string_view inner = Mid(text, p + static_cast<long>(kOpen.size()));
+  const long end = InStr(inner, "]]>");
+  if (end > 0) inner = Left(inner, end - 1);
+  return std::string(inner);
+}
+
+}  // namespace molvar
