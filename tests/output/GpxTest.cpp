@@ -3,6 +3,8 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+
 #include "core/Errors.h"
 #include "core/SpeedDistance.h"
 #include "core/Text.h"
