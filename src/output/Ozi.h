@@ -20,7 +20,7 @@ void WriteOziTrackPoint(Molvar& m, int32_t i);
 // display, colours, description, pointer direction, Garmin display, proximity, feet, font size,
 // font style, symbol size.
 void WriteOziWaypoint(Molvar& m, int32_t k);
-// Part 0 (the date) or 1 (the time) of a timestamp: the text before or after its first blank;
+// The date (selector 0) or the time (selector 1) of a timestamp: the text before or after its first blank;
 // both empty when it has no blank.
 std::string OziDateTimePart(std::string_view text, int16_t part);
 // A text as one comma-separated field: commas become the character Ozi reads as a comma inside a
