@@ -20,8 +20,8 @@ void WriteOziTrackPoint(Molvar& m, int32_t i);
 // display, colours, description, pointer direction, Garmin display, proximity, feet, font size,
 // font style, symbol size.
 void WriteOziWaypoint(Molvar& m, int32_t k);
-// The date (selector 0) or the time (selector 1) of a timestamp: the text before or after its first blank;
-// both empty when it has no blank.
+// The date (selector 0) or the time (selector 1) of a timestamp: the text before or after its
+// first blank; both empty when it has no blank.
 std::string OziDateTimePart(std::string_view text, int16_t part);
 // A text as one comma-separated field: commas become the character Ozi reads as a comma inside a
 // field (209), line breaks and other control characters become blanks.
