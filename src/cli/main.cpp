@@ -7,6 +7,7 @@
 #include "app/Conversion.h"
 #include "app/Molvar.h"
 #include "app/ProgramFolder.h"
+#include "app/Resources.h"
 #include "platform/ConsolePlatform.h"
 
 namespace {
@@ -92,7 +93,10 @@ int main(int argc, char** argv) {
   if (!a.error.empty()) return UsageError(a.error);
   try {
     molvar::ConsolePlatform platform(std::cerr);
-    molvar::Molvar m(platform, a.folder.empty() ? molvar::DefaultProgramFolder() : a.folder);
+    const std::string folder = a.folder.empty() ? molvar::DefaultProgramFolder() : a.folder;
+    // The KML refers to the icons and the legend in the program folder.
+    molvar::InstallResources(folder);
+    molvar::Molvar m(platform, folder);
     const molvar::ConversionResult result = molvar::RunConversion(m, platform, a.request);
     if (result.exitCode == molvar::kConversionUsage) return UsageError(result.usageError);
     std::cout << result.info << '\n';

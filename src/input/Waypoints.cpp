@@ -8,6 +8,8 @@
 #include "input/LineReader.h"
 #include "input/TrackReader.h"
 #include "input/XmlTracks.h"
+#include "output/Gpx.h"
+#include "output/Ozi.h"
 #include "output/kml/KmlFrame.h"
 #include "output/kml/Placemarks.h"
 
@@ -19,18 +21,23 @@ constexpr int kOziWaypointHeaderLines = 4;
 constexpr int32_t kNoOziAltitude = -777;
 constexpr int32_t kTestBoxWaypointLimit = 500;
 
-// 0 when the output could not be started.
+// False when the output could not be started (its writer has shown why).
 bool StartOutput(Molvar& m) {
   switch (m.OutputFormat) {
     case kFormatKml: return WriteKmlHeader(m) == 0;
-    default: return false;
+    case kFormatGpx: WriteGpxHeader(m); return true;
+    default: WriteOziHeader(m, kOziWaypoints); return true;
   }
 }
 
 void EndOutput(Molvar& m) {
   switch (m.OutputFormat) {
     case kFormatKml: WriteKmlFooter(m); return;
-    default: m.Out.Close(); return;
+    case kFormatGpx: WriteGpxFooter(m); return;
+    default:
+      m.Out.Close();
+      m.frmMain.txtInfo.Text = " Created " + IntToText(m.Waypoints.WptCount) + " waypoints. Output: " + m.OutputName;
+      return;
   }
 }
 

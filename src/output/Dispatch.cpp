@@ -3,6 +3,8 @@
 #include "app/Molvar.h"
 #include "core/Numbers.h"
 #include "core/SpeedDistance.h"
+#include "output/Gpx.h"
+#include "output/Ozi.h"
 #include "output/kml/KmlFrame.h"
 #include "output/kml/Placemarks.h"
 #include "output/kml/Segments.h"
@@ -93,13 +95,26 @@ void WriteOutputFile(Molvar& m) {
     m.OutputPath = m.OutputTrackPath.empty() ? m.ProgramPath(m.OutputName) : m.OutputTrackPath + "/" + m.OutputName;
   }
   m.Kml.SegmentCount = 1;
-  switch (m.OutputFormat) {
-    case kFormatKml:
-      if (WriteKmlHeader(m) != 0) return;
-      WriteKmlSegments(m);
-      WriteKmlFooter(m);
-      return;
-    default: return;
+  if (m.OutputFormat == kFormatKml) {
+    if (WriteKmlHeader(m) != 0) return;
+    WriteKmlSegments(m);
+    WriteKmlFooter(m);
+    return;
+  }
+  try {
+    if (m.OutputFormat == kFormatGpx) {
+      WriteGpxHeader(m);
+      WriteGpxSegments(m);
+      WriteGpxFooter(m);
+    } else {
+      WriteOziHeader(m, kOziTrack);
+      for (int32_t i = 1; i <= m.Track.StoredCount(); ++i) WriteOziTrackPoint(m, i);
+      m.Out.Close();
+    }
+  } catch (const std::exception& e) {
+    // The previous file at OutputPath stays as it was.
+    m.Out.Abandon();
+    ShowBug(m, "WriteOutputFile", e);
   }
 }
 

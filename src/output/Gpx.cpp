@@ -15,9 +15,9 @@ constexpr const char* kGpxNamespace = "http://www.topografix.com/GPX/1/0";
 constexpr const char* kXsiNamespace = "http://www.w3.org/2001/XMLSchema-instance";
 constexpr MarkupEncoding kGpxEncoding = MarkupEncoding::Latin1;
 
-// Only a track conversion wraps its segments in one trk; the other track sources (Garmin, APRS)
-// put them straight into gpx.
-bool InTrackElement(const Molvar& m) { return m.ProgramMode == kModeConvertTracks; }
+// Every track goes into one trk, the only place GPX allows segments (peers read nothing else);
+// only a track conversion also writes the time and bounds.
+bool InTrackElement(const Molvar& m) { return m.ProgramMode != kModeConvertWaypoints; }
 
 // ` lat="…" lon="…">` closing a trkpt or wpt start tag.
 void AppendLatLon(std::string& line, double latitude, double longitude) {
@@ -63,7 +63,7 @@ void GpxBounds(Molvar& m) {
 }
 
 void WriteGpxHeader(Molvar& m) {
-  const bool track = InTrackElement(m);
+  const bool track = m.ProgramMode == kModeConvertTracks;
   if (track) GpxBounds(m);
   OutputFile& out = m.Out;
   out.Open(m.OutputPath);
@@ -77,8 +77,8 @@ void WriteGpxHeader(Molvar& m) {
     const GpxState& b = m.Gpx;
     out.Line("<bounds minlat=\"" + DoubleToText(b.GpxMinLat) + "\" minlon=\"" + DoubleToText(b.GpxMinLon) +
              "\" maxlat=\"" + DoubleToText(b.GpxMaxLat) + "\" maxlon=\"" + DoubleToText(b.GpxMaxLon) + "\"/>");
-    out.Line("<trk>");
   }
+  if (InTrackElement(m)) out.Line("<trk>");
   out.Line("<name>" + MarkupText(GetTrackTitle(m), kGpxEncoding) + "</name>");
   out.Line("");
 }

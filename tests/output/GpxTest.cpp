@@ -203,7 +203,7 @@ TEST(GpxWriter, WaypointsFollowTheNameLineWithEscapedTextsInLatin1) {
                       "name (String) = Odd ]]> name", "desc (String) = caf\xC3\xA9", "POINT (151.2153 -33.8568)"});
 }
 
-TEST(GpxWriter, OtherTrackSourcesPutSegmentsStraightIntoGpx) {
+TEST(GpxWriter, OtherTrackSourcesHaveATrackWithoutTimeOrBounds) {
   TestProgram t;
   Molvar& m = *t;
   m.ProgramMode = kModeGarmin;
@@ -214,11 +214,13 @@ TEST(GpxWriter, OtherTrackSourcesPutSegmentsStraightIntoGpx) {
   WriteTrack(t, "garmin.gpx");
   const std::string text = ReadFile(t.folder.File("garmin.gpx"));
   EXPECT_EQ(text.find("<bounds"), std::string::npos);
-  EXPECT_EQ(text.find("trk>"), std::string::npos);
-  ExpectInOrder(text, {"gpx.xsd\">\r\n<name>Garmin</name>\r\n\r\n<!--  Write segment number 1  -->\r\n<trkseg>\r\n",
-                       "</trkseg>\r\n\r\n</gpx>\r\n"});
+  EXPECT_EQ(text.find("<time>2007-06-01T10:00:00Z</time>\r\n<"), std::string::npos);
+  ExpectInOrder(text, {"gpx.xsd\">\r\n<trk>\r\n<name>Garmin</name>\r\n\r\n<!--  Write segment number 1  -->\r\n"
+                       "<trkseg>\r\n",
+                       "</trkseg>\r\n\r\n</trk>\r\n</gpx>\r\n"});
   ExpectWellFormedXml(t.folder.File("garmin.gpx"));
-  // GDAL still finds the points; gpsbabel reads track points only inside a trk.
+  const std::string babel = RunCommand("gpsbabel -t -i gpx -f '" + t.folder.File("garmin.gpx") + "' -o unicsv -F - 2>&1");
+  ExpectInOrder(babel, {"45.000000,-75.000000", "45.010000,-75.000000"});
   const std::string ogr = RunCommand("ogrinfo -ro -al '" + t.folder.File("garmin.gpx") + "' track_points 2>&1");
   ExpectInOrder(ogr, {"Feature Count: 2", "2007/06/01 10:00:00+00", "POINT (-75 45)", "POINT (-75 45.01)"});
 }
