@@ -110,6 +110,8 @@ void WriteOutputFile(Molvar& m) {
       WriteOziHeader(m, kOziTrack);
       for (int32_t i = 1; i <= m.Track.StoredCount(); ++i) WriteOziTrackPoint(m, i);
       m.Out.Close();
+      // As the GPX tail does, so the status line names what was written.
+      m.frmMain.txtInfo.Text += " Output: " + m.OutputName;
     }
   } catch (const std::exception& e) {
     // The previous file at OutputPath stays as it was.
