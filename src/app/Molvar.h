@@ -72,6 +72,9 @@ struct Molvar {
   std::string OutputTrackPath;
   std::string OutputPlacemarkPath;
   int16_t TestMode = 0;
+  struct {
+    int SavedWidth = 0, SavedHeight = 0;  // window size before test mode grew it
+  } TestBoxState;
 
   // Display units
   double UnitFactor = 1.0;

@@ -2,6 +2,7 @@
 
 #include <chrono>
 #include <ctime>
+#include <filesystem>
 #include <ostream>
 
 #include "core/DateTime.h"
@@ -35,6 +36,20 @@ long ConsolePlatform::ShellOpen(std::string_view, std::string_view, std::string_
 }
 
 void ConsolePlatform::StartProgram(std::string_view) { throw RuntimeError(kErrFileNotFound); }
+void ConsolePlatform::StartTextEditor(std::string_view) { throw RuntimeError(kErrFileNotFound); }
+
+std::string ConsolePlatform::ProgramFileDate() {
+  std::error_code error;
+  const auto written = std::filesystem::last_write_time("/proc/self/exe", error);
+  if (error) return {};
+  const auto seconds = std::chrono::file_clock::to_sys(written);
+  const std::time_t t = std::chrono::system_clock::to_time_t(seconds);
+  std::tm local{};
+  localtime_r(&t, &local);
+  char text[16];
+  std::strftime(text, sizeof text, "%Y-%m-%d", &local);
+  return text;
+}
 
 uint32_t ConsolePlatform::TickCount() {
   using namespace std::chrono;

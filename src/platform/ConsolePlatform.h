@@ -23,6 +23,8 @@ class ConsolePlatform : public Platform {
   long ShellOpen(std::string_view verb, std::string_view target, std::string_view parameters,
                  std::string_view folder) override;
   void StartProgram(std::string_view commandLine) override;
+  void StartTextEditor(std::string_view file) override;
+  std::string ProgramFileDate() override;
   bool InternetAvailable() override { return false; }
   void SetTopMost(WindowId, bool) override {}
   void Beep(int, int) override {}

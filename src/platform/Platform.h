@@ -49,6 +49,11 @@ class Platform {
   // Starts a program by command line: program path, a blank, the arguments. A program that
   // cannot be started raises RuntimeError "File not found" (53).
   virtual void StartProgram(std::string_view commandLine) = 0;
+  // Opens a file in the desktop's default text editor (the program registered for plain text);
+  // raises RuntimeError "File not found" (53) when there is none.
+  virtual void StartTextEditor(std::string_view file) = 0;
+  // The date of the running program's file, "yyyy-mm-dd"; empty when it cannot be read.
+  virtual std::string ProgramFileDate() = 0;
 
   virtual bool InternetAvailable() = 0;
   virtual void SetTopMost(WindowId window, bool topMost) = 0;

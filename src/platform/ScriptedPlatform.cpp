@@ -75,6 +75,16 @@ void ScriptedPlatform::StartProgram(std::string_view commandLine) {
   if (!ok) throw RuntimeError(kErrFileNotFound);
 }
 
+void ScriptedPlatform::StartTextEditor(std::string_view file) {
+  calls.push_back({"StartTextEditor", std::string(file), {}, MsgButtons::OK, MsgIcon::None, {}, {}});
+  bool ok = true;
+  if (!startResults.empty()) {
+    ok = startResults.front();
+    startResults.pop_front();
+  }
+  if (!ok) throw RuntimeError(kErrFileNotFound);
+}
+
 bool ScriptedPlatform::InternetAvailable() {
   calls.push_back({"InternetAvailable", {}, {}, MsgButtons::OK, MsgIcon::None, {}, {}});
   return internet;

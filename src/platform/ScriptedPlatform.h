@@ -34,6 +34,7 @@ class ScriptedPlatform : public Platform {
   std::deque<long> shellResults;                     // shell open (default: 42, started)
   std::deque<bool> startResults;                     // program start (default: true, started)
   bool internet = false;
+  std::string programDate = "2026-12-01";
   int64_t now = 0;
   uint32_t tick = 0;
   uint32_t tickStep = 10;  // each TickCount() call advances the clock
@@ -51,6 +52,8 @@ class ScriptedPlatform : public Platform {
   long ShellOpen(std::string_view verb, std::string_view target, std::string_view parameters,
                  std::string_view folder) override;
   void StartProgram(std::string_view commandLine) override;
+  void StartTextEditor(std::string_view file) override;
+  std::string ProgramFileDate() override { return programDate; }
   bool InternetAvailable() override;
   void SetTopMost(WindowId window, bool topMost) override;
   void Beep(int frequencyHz, int durationMs) override;
