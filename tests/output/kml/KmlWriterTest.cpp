@@ -2,76 +2,38 @@
 #include <gtest/gtest.h>
 
 #include <array>
-#include <cstdio>
-#include <memory>
 
-#include "core/Numbers.h"
-#include "core/SpeedDistance.h"
-#include "core/Text.h"
 #include "output/kml/KmlFrame.h"
-#include "output/kml/Segments.h"
-#include "support/TestProgram.h"
+#include "output/kml/Placemarks.h"
+#include "support/KmlTesting.h"
 
 namespace molvar {
 namespace {
 
+using testing::Coord;
+using testing::ExpectPeersRead;
+using testing::KmlGolden;
 using testing::ReadFile;
 using testing::TestProgram;
-
-std::string Golden(const std::string& name, const std::string& folder) {
-  return Replace(ReadFile(std::string(MOLVAR_GOLDEN_DIR) + "/kml/" + name), "{FOLDER}", folder);
-}
-
-// What the dispatcher does for a KML track.
-void WriteTrack(TestProgram& t, const std::string& name) {
-  Molvar& m = *t;
-  m.OutputPath = t.folder.File(name);
-  m.OutputName = name;
-  MarkDays(m);
-  MarkSegments(m);
-  m.Speed.FastestIndex = FindFastestPoint(m);
-  m.Kml.SegmentCount = 1;
-  ASSERT_EQ(WriteKmlHeader(m), 0);
-  WriteKmlSegments(m);
-  WriteKmlFooter(m);
-}
-
-std::string Run(const std::string& command, int* status = nullptr) {
-  std::string out;
-  std::unique_ptr<FILE, int (*)(FILE*)> pipe(popen(command.c_str(), "r"), pclose);
-  if (!pipe) return out;
-  std::array<char, 4096> buf{};
-  std::size_t n = 0;
-  while ((n = fread(buf.data(), 1, buf.size(), pipe.get())) > 0) out.append(buf.data(), n);
-  const int rc = pclose(pipe.release());
-  if (status != nullptr) *status = rc;
-  return out;
-}
-
-// xmllint, GDAL and gpsbabel all read the file, and the coordinates come back in order.
-void ExpectPeersRead(const std::string& path, const std::vector<std::string>& lonLatInOrder) {
-  int rc = -1;
-  Run("xmllint --noout '" + path + "' 2>&1", &rc);
-  EXPECT_EQ(rc, 0) << Run("xmllint --noout '" + path + "' 2>&1");
-
-  const std::string ogr = Run("ogrinfo -ro -al '" + path + "' 2>&1", &rc);
-  EXPECT_EQ(rc, 0) << ogr;
-  std::size_t at = 0;
-  for (const auto& ll : lonLatInOrder) {
-    const std::size_t found = ogr.find(ll, at);
-    EXPECT_NE(found, std::string::npos) << ll << " not in order in:\n" << ogr;
-    if (found != std::string::npos) at = found;
-  }
-
-  const std::string babel = Run("gpsbabel -i kml -f '" + path + "' -o unicsv -F - 2>&1", &rc);
-  EXPECT_EQ(rc, 0) << babel;
-  EXPECT_NE(babel.find("Latitude"), std::string::npos) << babel;
-}
+using testing::WriteTrack;
 
 void AddThreePoints(TestProgram& t, std::array<double, 3> speeds = {0, 0, 0}) {
   t.AddPoint(45.0, -75.0, "2007-05-01 10:00:00 AM", speeds[0]);
   t.AddPoint(45.01, -75.0, "2007-05-01 10:01:00 AM", speeds[1]);
   t.AddPoint(45.02, -75.0, "2007-05-01 10:02:00 AM", speeds[2]);
+}
+
+// Three points 100, 120 and 140 m high, 67 km/h between them.
+void AddThreeHighPoints(TestProgram& t) {
+  AddThreePoints(t);
+  t->Track.at(1).Altitude = 100;
+  t->Track.at(2).Altitude = 120;
+  t->Track.at(3).Altitude = 140;
+}
+
+void SetAltitudeMode(Molvar& m, int mode) {
+  m.AltitudeMode = static_cast<int16_t>(mode);
+  m.frmMain.comboAltitude.ListIndex = mode;
 }
 
 TEST(KmlWriter, DefaultOptionsWriteTheHandWrittenDocumentAndOpenIt) {
@@ -81,14 +43,15 @@ TEST(KmlWriter, DefaultOptionsWriteTheHandWrittenDocumentAndOpenIt) {
   AddThreePoints(t);
   WriteTrack(t, "trip.kml");
   const std::string path = t.folder.File("trip.kml");
-  EXPECT_EQ(ReadFile(path), Golden("track_default.kml", t.folder.path().string()));
+  EXPECT_EQ(ReadFile(path), KmlGolden("track_default.kml", t.folder.path().string()));
   EXPECT_EQ(m.frmMain.txtInfo.Text, " Processed 3 trackpoints. (1 segments) Output: trip.kml");
   const auto starts = t.platform.CallsOf("StartProgram");
   ASSERT_EQ(starts.size(), 1u);
   EXPECT_EQ(starts[0].text, "/opt/google/earth/pro/google-earth-pro \"" + path + "\"");
   EXPECT_TRUE(t.platform.Messages().empty());
   EXPECT_TRUE(m.frmMain.cmdRefresh.Enabled);
-  ExpectPeersRead(path, {"-75 45 0", "-75 45.02 0", "-75 45.01 0", "-75 45 0", "-75 45.01 0", "-75 45.02 0"});
+  ExpectPeersRead(path, {{-75, 45, 0}, {-75, 45.02, 0}, {-75, 45.01, 0}},
+                  {{{-75, 45, 0}, {-75, 45.01, 0}, {-75, 45.02, 0}}});
 }
 
 TEST(KmlWriter, SpeedColoursAltitudeAsSpeedAndDetailsWithThreshold) {
@@ -101,8 +64,7 @@ TEST(KmlWriter, SpeedColoursAltitudeAsSpeedAndDetailsWithThreshold) {
   m.Track.at(2).ColorBand = 5;
   m.Track.at(3).ColorBand = 6;
   m.ColorVaryMode = 3;
-  m.AltitudeMode = 3;
-  f.comboAltitude.ListIndex = 3;
+  SetAltitudeMode(m, 3);
   m.SpeedGain = 20;
   f.chkUseThreshold.Value = 1;
   f.txtSpeedThreshold.Text = "50";
@@ -113,12 +75,76 @@ TEST(KmlWriter, SpeedColoursAltitudeAsSpeedAndDetailsWithThreshold) {
   f.txtTitle.Text = "Ride & Run <1>";
   WriteTrack(t, "ride.kml");
   const std::string path = t.folder.File("ride.kml");
-  EXPECT_EQ(ReadFile(path), Golden("track_speed_details.kml", t.folder.path().string()));
+  EXPECT_EQ(ReadFile(path), KmlGolden("track_speed_details.kml", t.folder.path().string()));
   EXPECT_EQ(f.txtInfo.Text, " Processed 3 trackpoints. (2 segments) Output: ride.kml");
   EXPECT_TRUE(t.platform.CallsOf("StartProgram").empty());
   EXPECT_TRUE(f.cmdOpen.Enabled);
   EXPECT_TRUE(f.cmdOpen.HasFocus);
-  ExpectPeersRead(path, {"-75 45 0", "-75 45.01 1100", "-75 45.02 1300"});
+  ExpectPeersRead(path, {{-75, 45, 0}, {-75, 45.01, 1100}, {-75, 45.02, 1300}},
+                  {{{-75, 45, 0}, {-75, 45.01, 1100}}, {{-75, 45.01, 1100}, {-75, 45.02, 1300}}});
+}
+
+TEST(KmlWriter, AbsoluteAltitudeInMetresWithViewFromTheTextBoxes) {
+  TestProgram t;
+  Molvar& m = *t;
+  auto& f = m.frmMain;
+  AddThreeHighPoints(t);
+  SetAltitudeMode(m, 1);
+  m.AltitudeFactor = 1.0;
+  m.AltitudeUnitLabel = " meters";
+  f.chkDetailed.Value = 0;
+  f.chkAuto.Value = 0;
+  f.txtHeading.Text = "15";
+  f.txtTilt.Text = "60";
+  WriteTrack(t, "hill.kml");
+  const std::string path = t.folder.File("hill.kml");
+  EXPECT_EQ(ReadFile(path), KmlGolden("track_absolute.kml", t.folder.path().string()));
+  EXPECT_TRUE(t.platform.Messages().empty());
+  ExpectPeersRead(path, {{-75, 45, 100}, {-75, 45.02, 140}, {-75, 45.01, 120}},
+                  {{{-75, 45, 100}, {-75, 45.01, 120}, {-75, 45.02, 140}}});
+}
+
+TEST(KmlWriter, ExtrudedTrackWithTransparencyWidthAndChosenColour) {
+  TestProgram t;
+  Molvar& m = *t;
+  auto& f = m.frmMain;
+  AddThreeHighPoints(t);
+  SetAltitudeMode(m, 2);
+  m.TransparencyLevel = 128;
+  m.UserColorPointer = 3;
+  f.sldrWidth.Value = 5;
+  f.chkDetailed.Value = 0;
+  f.chkStartFinish.Value = 0;
+  f.chkAuto.Value = 0;
+  f.chkUseFilename.Value = 0;
+  f.txtTitle.Text = "Ridge walk";
+  WriteTrack(t, "ridge.kml");
+  const std::string path = t.folder.File("ridge.kml");
+  EXPECT_EQ(ReadFile(path), KmlGolden("track_extrude.kml", t.folder.path().string()));
+  EXPECT_TRUE(t.platform.Messages().empty());
+  ExpectPeersRead(path, {{-75, 45.01, 120}}, {{{-75, 45, 100}, {-75, 45.01, 120}, {-75, 45.02, 140}}});
+}
+
+TEST(KmlWriter, SpeedAsAltitudeInMilesRoundsPlacemarkHeightsToEven) {
+  TestProgram t;
+  Molvar& m = *t;
+  auto& f = m.frmMain;
+  // Speeds from the file: 30.25 and 12.25 km/h, scaled by 10 to 302.5 and 122.5.
+  AddThreePoints(t, {0, 30.25, 12.25});
+  SetAltitudeMode(m, 3);
+  m.SpeedGain = 10;
+  m.UnitFactor = 0.6213712;
+  m.SpeedUnitLabel = " mph";
+  m.DistanceUnitLabel = " miles";
+  f.chkDetailed.Value = 0;
+  f.chkAuto.Value = 0;
+  f.chkUseFilename.Value = 0;
+  f.txtTitle.Text = "Speed as height";
+  WriteTrack(t, "height.kml");
+  const std::string path = t.folder.File("height.kml");
+  EXPECT_EQ(ReadFile(path), KmlGolden("track_speed_altitude.kml", t.folder.path().string()));
+  ExpectPeersRead(path, {{-75, 45, 0}, {-75, 45.02, 122}, {-75, 45.01, 302}},
+                  {{{-75, 45, 0}, {-75, 45.01, 302.5}, {-75, 45.02, 122.5}}});
 }
 
 }  // namespace
