@@ -2,6 +2,9 @@
 #include <gtest/gtest.h>
 
 #include <array>
+#include <initializer_list>
+#include <string>
+#include <vector>
 
 #include "output/kml/KmlFrame.h"
 #include "output/kml/Placemarks.h"
@@ -145,6 +148,85 @@ TEST(KmlWriter, SpeedAsAltitudeInMilesRoundsPlacemarkHeightsToEven) {
   EXPECT_EQ(ReadFile(path), KmlGolden("track_speed_altitude.kml", t.folder.path().string()));
   ExpectPeersRead(path, {{-75, 45, 0}, {-75, 45.02, 122}, {-75, 45.01, 302}},
                   {{{-75, 45, 0}, {-75, 45.01, 302.5}, {-75, 45.02, 122.5}}});
+}
+
+// Points 0.01 degree apart along the meridian, one minute apart from 10:00 AM.
+void AddMeridianPoints(TestProgram& t, int count) {
+  for (int i = 0; i < count; ++i) {
+    t.AddPoint(45.0 + 0.01 * i, -75.0, "2007-05-01 10:0" + std::to_string(i) + ":00 AM");
+  }
+}
+
+std::vector<Coord> Meridian(std::initializer_list<int> steps) {
+  std::vector<Coord> line;
+  for (const int i : steps) line.push_back({-75, 45.0 + 0.01 * i, 0});
+  return line;
+}
+
+TEST(KmlWriter, VaryBySegmentStartsAtTheUserColourAndWrapsAroundThePalette) {
+  TestProgram t;
+  Molvar& m = *t;
+  auto& f = m.frmMain;
+  AddMeridianPoints(t, 5);
+  for (const int i : {2, 3, 4}) m.Track.at(i).Flag = 1;
+  m.ColorVaryMode = 1;
+  m.UserColorPointer = 7;
+  m.TransparencyLevel = 10;
+  f.chkHalfSize.Value = 1;
+  f.sldrWidth.Value = 4;
+  f.chkDetailed.Value = 0;
+  f.chkStartFinish.Value = 0;
+  f.chkFastest.Value = 0;
+  f.chkAuto.Value = 0;
+  f.chkUseFilename.Value = 0;
+  f.txtTitle.Text = "Four segments";
+  WriteTrack(t, "segs.kml");
+  const std::string path = t.folder.File("segs.kml");
+  EXPECT_EQ(ReadFile(path), KmlGolden("track_vary_segment.kml", t.folder.path().string()));
+  EXPECT_EQ(f.txtInfo.Text, " Processed 5 trackpoints. (4 segments) Output: segs.kml");
+  ExpectPeersRead(path, {}, {Meridian({0, 1}), Meridian({1, 2}), Meridian({2, 3}), Meridian({3, 4})});
+}
+
+TEST(KmlWriter, VaryByDateColoursEachDayAndCountsTheDays) {
+  TestProgram t;
+  Molvar& m = *t;
+  auto& f = m.frmMain;
+  t.AddPoint(45.00, -75.0, "2007-05-01 11:00:00 PM");
+  t.AddPoint(45.01, -75.0, "2007-05-01 11:01:00 PM");
+  t.AddPoint(45.02, -75.0, "2007-05-02 01:00:00 AM");
+  t.AddPoint(45.03, -75.0, "2007-05-02 01:01:00 AM");
+  m.ColorVaryMode = 2;
+  f.chkDetailed.Value = 0;
+  f.chkFastest.Value = 0;
+  f.chkAuto.Value = 0;
+  WriteTrack(t, "days.kml");
+  const std::string path = t.folder.File("days.kml");
+  EXPECT_EQ(ReadFile(path), KmlGolden("track_vary_date.kml", t.folder.path().string()));
+  EXPECT_EQ(f.txtInfo.Text, " Processed 4 trackpoints. (2 segments) (2 days) Output: days.kml");
+  ExpectPeersRead(path, {{-75, 45, 0}, {-75, 45.03, 0}}, {Meridian({0, 1, 2}), Meridian({2, 3})});
+}
+
+TEST(KmlWriter, CollapsedSegmentsJoinEachDayIntoOneLine) {
+  TestProgram t;
+  Molvar& m = *t;
+  auto& f = m.frmMain;
+  t.AddPoint(45.00, -75.0, "2007-05-01 11:00:00 PM");
+  t.AddPoint(45.01, -75.0, "2007-05-01 11:01:00 PM");
+  t.AddPoint(45.02, -75.0, "2007-05-01 11:02:00 PM");
+  t.AddPoint(45.03, -75.0, "2007-05-02 01:00:00 AM");
+  t.AddPoint(45.04, -75.0, "2007-05-02 01:01:00 AM");
+  m.Track.at(2).Flag = 1;  // a break inside the first day, which collapsing ignores
+  m.ColorVaryMode = 2;
+  f.chkCollapse.Value = 1;
+  f.chkDetailed.Value = 0;
+  f.chkStartFinish.Value = 0;
+  f.chkFastest.Value = 0;
+  f.chkAuto.Value = 0;
+  WriteTrack(t, "collapsed.kml");
+  const std::string path = t.folder.File("collapsed.kml");
+  EXPECT_EQ(ReadFile(path), KmlGolden("track_collapsed.kml", t.folder.path().string()));
+  EXPECT_EQ(f.txtInfo.Text, " Processed 5 trackpoints. (2 days) Output: collapsed.kml");
+  ExpectPeersRead(path, {}, {Meridian({0, 1, 2, 3}), Meridian({3, 4})});
 }
 
 }  // namespace
