@@ -14,6 +14,7 @@ namespace molvar {
 namespace {
 
 using testing::Coord;
+using testing::ExpectWellFormed;
 using testing::ExpectPeersRead;
 using testing::KmlGolden;
 using testing::ReadFile;
@@ -227,6 +228,105 @@ TEST(KmlWriter, CollapsedSegmentsJoinEachDayIntoOneLine) {
   EXPECT_EQ(ReadFile(path), KmlGolden("track_collapsed.kml", t.folder.path().string()));
   EXPECT_EQ(f.txtInfo.Text, " Processed 5 trackpoints. (2 days) Output: collapsed.kml");
   ExpectPeersRead(path, {}, {Meridian({0, 1, 2, 3}), Meridian({3, 4})});
+}
+
+TEST(KmlWriter, GoogleMapsOutputAsksForEachSegmentNameAndUsesTheMapsIcon) {
+  TestProgram t;
+  Molvar& m = *t;
+  auto& f = m.frmMain;
+  AddMeridianPoints(t, 4);
+  m.Track.at(3).Flag = 1;
+  m.OutputMode = kOutputGoogleMaps;
+  m.TrackFileType = 2;
+  m.WptFileType = 1;
+  m.IconPalette = 1;
+  m.IconX = 64;
+  m.IconY = 224;
+  f.chkDetailed.Value = 1;  // no details in Google Maps output
+  f.chkAuto.Value = 0;
+  t.platform.inputAnswers = {"Morning loop & back", ""};
+  WriteTrack(t, "gmaps.kml");
+  const std::string path = t.folder.File("gmaps.kml");
+  EXPECT_EQ(ReadFile(path), KmlGolden("gmaps_track.kml", t.folder.path().string()));
+  const auto asked = t.platform.CallsOf("InputBox");
+  ASSERT_EQ(asked.size(), 2u);
+  for (const auto& call : asked) {
+    EXPECT_EQ(call.text, "Overwrite the segment title for Google Maps if you wish...");
+    EXPECT_EQ(call.title, "Track title");
+  }
+  EXPECT_EQ(asked[0].parameters, "#1 10:00:00 AM (2)");
+  EXPECT_EQ(asked[1].parameters, "#2 10:02:00 AM (2)");
+  EXPECT_TRUE(t.platform.Messages().empty());
+  EXPECT_EQ(f.txtInfo.Text, " Processed 4 trackpoints. (2 segments) Output: gmaps.kml");
+  ExpectPeersRead(path, {{-75, 45, 0}, {-75, 45.03, 0}, {-75, 45.01, 0}}, {Meridian({0, 1, 2}), Meridian({2, 3})});
+}
+
+TEST(KmlWriter, WaypointPlacemarksCarryTheirOwnViewAndNoTrackExtras) {
+  TestProgram t;
+  Molvar& m = *t;
+  auto& f = m.frmMain;
+  m.ProgramMode = kModeConvertWaypoints;
+  m.WptFileType = 1;
+  SetAltitudeMode(m, 1);
+  f.txtHeading.Text = "30";
+  f.AltLabel.Visible = false;
+  m.OutputPath = t.folder.File("wpts.kml");
+  m.OutputName = "wpts.kml";
+  struct {
+    const char* name;
+    double lon, lat;
+    int32_t alt;
+  } const waypoints[] = {{"Summit", -75.5, 45.25, 250}, {"Car park", -75.4875, 45.2, 0},
+                         {"Hut & Spring", -75.12345678901234, 45.3, 1200}};
+  ASSERT_EQ(WriteKmlHeader(m), 0);
+  for (const auto& w : waypoints) {
+    m.Waypoints.Add();
+    int32_t alt = w.alt;
+    WriteKmlPlacemark(m, w.name, w.lon, w.lat, alt, "FFFFFF", kPlacemarkGeneral);
+  }
+  WriteKmlFooter(m);
+  const std::string path = t.folder.File("wpts.kml");
+  EXPECT_EQ(ReadFile(path), KmlGolden("waypoints.kml", t.folder.path().string()));
+  // A waypoint without height raises no altitude warning in waypoint mode.
+  EXPECT_TRUE(t.platform.Messages().empty());
+  EXPECT_TRUE(f.AltLabel.Visible);
+  EXPECT_EQ(f.txtInfo.Text, " Created 3 placemarks. Output: wpts.kml");
+  ASSERT_EQ(t.platform.CallsOf("StartProgram").size(), 1u);
+  ExpectPeersRead(path, {{-75.5, 45.25, 250}, {-75.4875, 45.2, 0}, {-75.1234567890123, 45.3, 1200}}, {});
+}
+
+TEST(KmlWriter, DetailsWithSpeedThresholdMarkStoppedFastAndTooFastPoints) {
+  TestProgram t;
+  Molvar& m = *t;
+  auto& f = m.frmMain;
+  t.AddPoint(45.00, -75.0, "2006-01-01 10:00:00 AM");
+  t.AddPoint(45.01, -75.0, "2006-01-01 10:01:00 AM", 55);
+  t.AddPoint(45.02, -75.0, "2006-01-01 00:00:00", 65);
+  t.AddPoint(45.03, -75.0, "2007-05-01 10:03:00 AM", 60);
+  t.AddPoint(45.04, -75.0, "2007-05-01 10:04:00 AM", 50.04);
+  m.Track.at(2).PointText = "Rest stop & caf\xC3\xA9";
+  m.Track.at(3).Altitude = 350;
+  m.Track.at(4).Flag = 1;
+  m.Track.at(5).PointText = "odd ]]> text";
+  m.TransparencyLevel = 200;
+  f.chkHalfSize.Value = 1;
+  f.chkUseThreshold.Value = 1;
+  f.txtSpeedThreshold.Text = "50";
+  f.chkStartFinish.Value = 0;
+  f.chkFastest.Value = 0;
+  f.chkAuto.Value = 0;
+  f.chkUseFilename.Value = 0;
+  f.txtTitle.Text = "Threshold ride";
+  WriteTrack(t, "threshold.kml");
+  const std::string path = t.folder.File("threshold.kml");
+  EXPECT_EQ(ReadFile(path), KmlGolden("details_threshold.kml", t.folder.path().string()));
+  EXPECT_TRUE(t.platform.Messages().empty());
+  EXPECT_EQ(f.txtInfo.Text, " Processed 5 trackpoints. (2 segments) Output: threshold.kml");
+  std::vector<Coord> dots = Meridian({0, 1, 2, 3, 4});
+  dots[2].alt = 350;
+  std::vector<Coord> first = Meridian({0, 1, 2, 3});
+  first[2].alt = 350;
+  ExpectPeersRead(path, dots, {first, Meridian({3, 4})});
 }
 
 }  // namespace
