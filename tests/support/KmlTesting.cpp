@@ -81,6 +81,26 @@ void WriteTrack(TestProgram& t, const std::string& name) {
   WriteKmlFooter(m);
 }
 
+std::vector<std::string> WrittenLines(TestProgram& t, const std::function<void(Molvar&)>& write) {
+  const std::string path = t.folder.File("part.txt");
+  t->Out.Open(path);
+  write(*t);
+  t->Out.Close();
+  std::string text = ReadFile(path);
+  std::vector<std::string> lines;
+  std::size_t from = 0;
+  while (from < text.size()) {
+    const std::size_t end = text.find("\r\n", from);
+    if (end == std::string::npos) {
+      lines.push_back(text.substr(from));
+      break;
+    }
+    lines.push_back(text.substr(from, end - from));
+    from = end + 2;
+  }
+  return lines;
+}
+
 void ExpectWellFormed(const std::string& path) {
   int rc = -1;
   const std::string lint = RunCommand("xmllint --noout " + Quoted(path) + " 2>&1", &rc);

@@ -1,5 +1,6 @@
 #pragma once
 // Writing whole KML documents in tests and having real peers read them back.
+#include <functional>
 #include <string>
 #include <vector>
 
@@ -22,6 +23,9 @@ std::string RunCommand(const std::string& command, int* status = nullptr);
 // What the dispatcher does for a KML track: days, segments and fastest point, then head,
 // segments and tail into the program folder's `name`.
 void WriteTrack(TestProgram& t, const std::string& name);
+
+// The lines (without CR LF) that `write` puts into a fresh output file of the program folder.
+std::vector<std::string> WrittenLines(TestProgram& t, const std::function<void(Molvar&)>& write);
 
 // xmllint finds the file well-formed.
 void ExpectWellFormed(const std::string& path);
