@@ -70,7 +70,6 @@ std::string CommentText(std::string_view text) {
   }
   // "- -" may meet a following "-" again ("---").
   while (Contains(s, "--")) s = Replace(s, "--", "- -");
-  if (!s.empty() && s.back() == '-') s.push_back(' ');
   return s;
 }
 

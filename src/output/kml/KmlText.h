@@ -11,7 +11,8 @@ namespace molvar {
 // Element content: "A & B <1>" gives "A &amp; B &lt;1>", "&amp;" stays, "&nbsp;" becomes
 // "&amp;nbsp;", "]]>" becomes "]]&gt;".
 std::string KmlText(std::string_view text);
-// The inside of a comment: legal characters, no "--" (written "- -"), no "-" at its end.
+// Text inside a comment, between fixed text that neither starts nor ends with "-": legal
+// characters and no "--" (written "- -").
 std::string CommentText(std::string_view text);
 
 }  // namespace molvar
