@@ -2,6 +2,8 @@
 // boxes, against a scripted platform.
 #include <gtest/gtest.h>
 
+#include <vector>
+
 #include "core/Errors.h"
 #include "output/kml/KmlFrame.h"
 #include "output/kml/Segments.h"
@@ -11,7 +13,6 @@ namespace molvar {
 namespace {
 
 using testing::ExpectPeersRead;
-using testing::ExpectWellFormed;
 using testing::ReadFile;
 using testing::TestProgram;
 using testing::WriteTrack;
@@ -28,6 +29,15 @@ void AddTwoPoints(TestProgram& t) {
 }
 
 bool Has(const std::string& text, const std::string& part) { return text.find(part) != std::string::npos; }
+
+// The peers read a document of AddTwoPoints: its detail dots when there are any, then start,
+// finish and fastest (point 2) placemarks when there are any, and the one line.
+void ExpectTwoPointsRead(const std::string& path, bool details, bool markers) {
+  std::vector<testing::Coord> points;
+  if (details) points = {{-75, 45, 0}, {-75, 45.01, 0}};
+  if (markers) points.insert(points.end(), {{-75, 45, 0}, {-75, 45.01, 0}, {-75, 45.01, 0}});
+  ExpectPeersRead(path, points, {{{-75, 45, 0}, {-75, 45.01, 0}}});
+}
 
 std::size_t CountOf(const std::string& text, const std::string& part) {
   std::size_t n = 0;
@@ -54,11 +64,12 @@ TEST(KmlFrame, EmptyTitleWarnsOnceAndNamesTheDocumentEnterTitleHere) {
   EXPECT_EQ(m.frmMain.txtTitle.Text, "Enter title here!");
   const std::string doc = ReadFile(t.folder.File("untitled.kml"));
   EXPECT_TRUE(Has(doc, "<Folder>\r\n<name>Enter title here!</name>\r\n\r\n"));
-  ExpectWellFormed(t.folder.File("untitled.kml"));
+  ExpectTwoPointsRead(t.folder.File("untitled.kml"), true, true);
 
   // The box put a title in place: the next write does not ask again.
   WriteTrack(t, "untitled2.kml");
   EXPECT_EQ(t.platform.Messages().size(), 1u);
+  ExpectTwoPointsRead(t.folder.File("untitled2.kml"), true, true);
 }
 
 TEST(KmlFrame, AutoNameTakesTheFileNameUpToItsLastDotAndNeverWarns) {
@@ -75,6 +86,7 @@ TEST(KmlFrame, AutoNameTakesTheFileNameUpToItsLastDotAndNeverWarns) {
   AddTwoPoints(t);
   WriteTrack(t, "x.kml");
   EXPECT_TRUE(t.platform.Messages().empty());
+  ExpectTwoPointsRead(t.folder.File("x.kml"), true, true);
 }
 
 TEST(KmlFrame, TitlesOfTheLiveAndStationModes) {
@@ -115,6 +127,7 @@ TEST(KmlFrame, AltitudeWarningYesSwitchesToClampedForTheRestOfTheRun) {
   const std::string doc = ReadFile(t.folder.File("flat.kml"));
   EXPECT_FALSE(Has(doc, "absolute"));
   EXPECT_EQ(CountOf(doc, "    <tessellate>1</tessellate><altitudeMode>clampedToGround</altitudeMode>\r\n"), 4u);
+  ExpectTwoPointsRead(t.folder.File("flat.kml"), false, true);
 
   // Never again in this run, even with a mode that would ask.
   m.AltitudeMode = 2;
@@ -122,6 +135,7 @@ TEST(KmlFrame, AltitudeWarningYesSwitchesToClampedForTheRestOfTheRun) {
   WriteTrack(t, "flat2.kml");
   EXPECT_EQ(t.platform.Messages().size(), 1u);
   EXPECT_TRUE(Has(ReadFile(t.folder.File("flat2.kml")), "    <altitudeMode>absolute</altitudeMode> <extrude>1</extrude>\r\n"));
+  ExpectTwoPointsRead(t.folder.File("flat2.kml"), false, true);
 }
 
 TEST(KmlFrame, AltitudeWarningNoKeepsTheModeAndNeverAsksAgain) {
@@ -140,7 +154,8 @@ TEST(KmlFrame, AltitudeWarningNoKeepsTheModeAndNeverAsksAgain) {
   const std::string doc = ReadFile(t.folder.File("kept.kml"));
   EXPECT_FALSE(Has(doc, "clampedToGround"));
   EXPECT_TRUE(Has(doc, "    <altitudeMode>absolute</altitudeMode> <extrude>1</extrude>\r\n"));
-  ExpectWellFormed(t.folder.File("kept.kml"));
+  ExpectTwoPointsRead(t.folder.File("kept.kml"), true, true);
+  ExpectTwoPointsRead(t.folder.File("kept2.kml"), true, true);
 }
 
 TEST(KmlFrame, AltitudeWarningOnlyForRecordedTracksWithoutHeightInAbsoluteModes) {
@@ -257,7 +272,9 @@ TEST(KmlFrame, DateTimesWithoutABlankGiveBareStartAndFinishNames) {
   const std::string doc = ReadFile(t.folder.File("bare.kml"));
   EXPECT_TRUE(Has(doc, "  <name>Start </name>\r\n"));
   EXPECT_TRUE(Has(doc, "  <name>Finish </name>\r\n"));
-  ExpectWellFormed(t.folder.File("bare.kml"));
+  // Without times there is no speed: the fastest point is the first.
+  ExpectPeersRead(t.folder.File("bare.kml"), {{-75, 45, 0}, {-75, 45.01, 0}, {-75, 45, 0}},
+                  {{{-75, 45, 0}, {-75, 45.01, 0}}});
 }
 
 TEST(KmlFrame, RealTimeTailLooksFromTheLastPointAlongTheCourseUnlessNorthUp) {
@@ -281,6 +298,7 @@ TEST(KmlFrame, RealTimeTailLooksFromTheLastPointAlongTheCourseUnlessNorthUp) {
     EXPECT_TRUE(m.frmMain.cmdOpen.Enabled);
     EXPECT_TRUE(t.platform.CallsOf("StartProgram").empty());
     EXPECT_TRUE(m.frmMain.cmdRefresh.Enabled);
+    ExpectTwoPointsRead(t.folder.File("nmea.kml"), false, false);
   }
 }
 
@@ -307,7 +325,7 @@ TEST(KmlFrame, AgwDocumentOpensItsFolderAndHasNoView) {
       << doc;
   EXPECT_FALSE(Has(doc, "<LookAt>"));
   EXPECT_EQ(m.frmMain.txtInfo.Text, " kept");
-  ExpectWellFormed(path);
+  ExpectTwoPointsRead(path, false, false);
 }
 
 TEST(KmlFrame, AprsLookupMarksTheStationAtTheLastPointAndLooksFromThere) {
