@@ -1,9 +1,12 @@
 // The details folder: one dot per track point, grouped by segment.
 #include <gtest/gtest.h>
 
+#include <memory>
 #include <string>
+#include <string_view>
 #include <vector>
 
+#include "core/Errors.h"
 #include "core/SpeedDistance.h"
 #include "output/kml/Details.h"
 #include "support/KmlTesting.h"
@@ -12,6 +15,7 @@ namespace molvar {
 namespace {
 
 using testing::TestProgram;
+using molvar::ScriptedPlatform;
 using testing::WrittenLines;
 
 std::vector<std::string> StartingWith(const std::vector<std::string>& lines, const std::string& prefix) {
@@ -179,6 +183,37 @@ TEST(Details, ThresholdBoundariesUseTheSpeedAsShown) {
   // A threshold of 0 turns the check off.
   t->frmMain.txtSpeedThreshold.Text = "0";
   EXPECT_TRUE(StartingWith(Details(t), "      <Icon><href>").empty());
+}
+
+// A platform whose palette warning box fails, as a broken desktop might.
+class FailingPaletteBox : public ScriptedPlatform {
+ public:
+  int MsgBox(std::string_view text, std::string_view title, MsgButtons buttons, MsgIcon icon) override {
+    const int answer = ScriptedPlatform::MsgBox(text, title, buttons, icon);
+    if (text.rfind("VaryColorPtr", 0) == 0) throw RuntimeError(kErrOverflow);
+    return answer;
+  }
+};
+
+TEST(Details, AnErrorEndsTheBlockWithTheBugBox) {
+  FailingPaletteBox platform;  // outlives the program that uses it
+  TestProgram t;
+  t.m = std::make_unique<Molvar>(platform, t.folder.path().string());
+  t.AddPoint(45.00, -75.0, "2007-05-01 10:00:00 AM");
+  t.AddPoint(45.01, -75.0, "2007-05-01 10:01:00 AM");
+  t->Track.at(2).ColorBand = 12;  // a CSV status beyond the palette
+  t->TrackFileType = 4;
+  const auto lines = Details(t);
+  const auto boxes = platform.Messages();
+  ASSERT_EQ(boxes.size(), 2u);
+  EXPECT_EQ(boxes[0].text, "VaryColorPtr out of range: \r\n11");
+  EXPECT_EQ(boxes[1].text, "WriteDetailedData bug " + RuntimeError::StandardDescription(kErrOverflow));
+  EXPECT_EQ(boxes[1].title, "Error");
+  EXPECT_EQ(boxes[1].buttons, MsgButtons::OK);
+  EXPECT_EQ(boxes[1].icon, MsgIcon::Exclamation);
+  // The block stops where the error struck.
+  ASSERT_FALSE(lines.empty());
+  EXPECT_EQ(lines.back(), "    <IconStyle>");
 }
 
 }  // namespace
