@@ -6,6 +6,7 @@
 #include "core/Text.h"
 #include "output/Dispatch.h"
 #include "output/kml/Details.h"
+#include "output/kml/KmlText.h"
 #include "output/kml/Placemarks.h"
 
 namespace molvar {
@@ -31,14 +32,6 @@ std::string FromFirstBlank(std::string_view dateTime) {
 }
 
 }  // namespace
-
-std::string CommentText(std::string_view text) {
-  std::string s = Replace(MarkupCdata(text), "--", "- -");
-  // "- -" may meet a following "-" again ("---").
-  while (Contains(s, "--")) s = Replace(s, "--", "- -");
-  if (!s.empty() && s.back() == '-') s.push_back(' ');
-  return s;
-}
 
 int32_t TextBoxInt(std::string_view text) { return RoundToInt32Or(Val(text), 0); }
 
@@ -78,7 +71,7 @@ int16_t WriteKmlHeader(Molvar& m) {
              IntToText(m.WptFileType) + "-" + IntToText(m.OutputMode) + " created with Molvar version " +
              CommentText(m.VersionText) + "  -->");
     out.Line("<Folder>");
-    out.Line("<name>" + MarkupText(GetTrackTitle(m)) + "</name>");
+    out.Line("<name>" + KmlText(GetTrackTitle(m)) + "</name>");
     if (m.ProgramMode == kModeAgw) out.Line("  <open>1</open>");
     out.Line("");
 
@@ -86,7 +79,7 @@ int16_t WriteKmlHeader(Molvar& m) {
       out.Line("<ScreenOverlay>");
       out.Line("<name>Legend</name>");
       out.Line("<Icon>");
-      out.Line("<href>" + MarkupText(m.ProgramPath("SpeedLegend.jpg")) + "</href>");
+      out.Line("<href>" + KmlText(m.ProgramPath("SpeedLegend.jpg")) + "</href>");
       out.Line("</Icon>");
       out.Line("<overlayXY x= \"0\" y=\"1\" xunits=\"fraction\" yunits=\" fraction\"/>");
       out.Line("<screenXY x=\"0\" y=\" 1\" xunits=\" fraction\" yunits=\" fraction\"/>");
@@ -174,7 +167,7 @@ void WriteLookAt(Molvar& m, double longitude, double latitude, int heading) {
   out.Line("  <longitude>" + DoubleToText(longitude) + "</longitude>");
   out.Line("  <latitude>" + DoubleToText(latitude) + "</latitude>");
   out.Line("  <range>" + FormatPattern(Val(m.frmMain.txtEyeAlt.Text) / m.AltitudeFactor, "0") + "</range>");
-  out.Line("  <tilt>" + MarkupText(m.frmMain.txtTilt.Text) + "</tilt>");
+  out.Line("  <tilt>" + KmlText(m.frmMain.txtTilt.Text) + "</tilt>");
   out.Line("  <heading>" + IntToText(heading) + "</heading>");
   out.Line("</LookAt>");
   out.Line("");

@@ -5,6 +5,8 @@
 #include <string>
 #include <string_view>
 
+#include "output/kml/KmlText.h"
+
 namespace molvar {
 
 struct Molvar;
@@ -21,8 +23,6 @@ void WriteLookAt(Molvar& m, double longitude, double latitude, int heading);
 std::string GetTrackTitle(Molvar& m);
 std::string TitleFromFileName(const Molvar& m);
 
-// Outside text inside an XML comment: markup-safe and without "--".
-std::string CommentText(std::string_view text);
 // The leading whole number of a text box, 0 when there is none or it is out of range.
 int32_t TextBoxInt(std::string_view text);
 

@@ -4,6 +4,7 @@
 
 #include "app/Molvar.h"
 #include "core/Markup.h"
+#include "output/kml/KmlText.h"
 #include "core/Numbers.h"
 #include "core/Text.h"
 #include "core/DateTime.h"
@@ -21,7 +22,7 @@ std::string PaletteLine(int palette) {
 void WriteIconLines(Molvar& m, int16_t kind) {
   OutputFile& out = m.Out;
   if (m.frmIconSelect.chkCustomIcon.Checked()) {
-    out.Line("        <href>" + MarkupText(m.ProgramPath("Icons/Custom.png")) + "</href>");
+    out.Line("        <href>" + KmlText(m.ProgramPath("Icons/Custom.png")) + "</href>");
     return;
   }
   int palette = m.IconPalette, x = m.IconX, y = m.IconY;
@@ -67,8 +68,8 @@ int CellOf(double pixels) {
 }  // namespace
 
 std::string GoogleMapsIconFile(const Molvar& m) {
-  const long row = std::lround(7.0 - m.IconY / 32.0);
-  const long column = std::lround(m.IconX / 32.0);
+  const int32_t row = RoundToInt32(7.0 - m.IconY / 32.0);
+  const int32_t column = RoundToInt32(m.IconX / 32.0);
   return "pal" + IntToText(m.IconPalette + 2) + "/icon" + IntToText(row * 8 + column) + ".png";
 }
 
@@ -102,7 +103,7 @@ void WriteKmlPlacemark(Molvar& m, std::string_view name, double longitude, doubl
       WriteSummaryBalloon(m);
     }
 
-    out.Line("  <name>" + MarkupText(name) + "</name>");
+    out.Line("  <name>" + KmlText(name) + "</name>");
     if (m.ProgramMode == kModeConvertWaypoints) {
       out.Line("");
       WriteLookAt(m, longitude, latitude, viewHeading);
@@ -112,7 +113,7 @@ void WriteKmlPlacemark(Molvar& m, std::string_view name, double longitude, doubl
       out.Line("  <styleUrl>root://styleMaps#default?iconId=0x307</styleUrl>");
       out.Line("  <Style>");
       out.Line("    <LabelStyle>");
-      out.Line("      <color>" + Hex2(m.TransparencyLevel) + MarkupText(colour) + "</color>");
+      out.Line("      <color>" + Hex2(m.TransparencyLevel) + KmlText(colour) + "</color>");
       out.Line("    </LabelStyle>");
       out.Line("    <IconStyle>");
       if (f.chkHalfSize.Checked()) out.Line("      <scale>0.5</scale>");
@@ -164,7 +165,8 @@ void ShowIconPalette(Molvar& m, int16_t choice) {
 }
 
 void optPalette_Click(Molvar& m, int index) {
-  if (index < 0 || index > 3) return;
+  if (!m.frmIconSelect.optPalette.Has(index)) return;
+  SelectOnly(m.frmIconSelect.optPalette, index);
   m.IconPalette = static_cast<int16_t>(index);
   ShowIconPalette(m, m.IconPalette);
 }
@@ -173,7 +175,8 @@ void chkCustomIcon_Click(Molvar& m) {
   ShowIconPalette(m, m.frmIconSelect.chkCustomIcon.Checked() ? 4 : m.IconPalette);
 }
 
-void picBig_MouseDown(Molvar& m, double x, double y) {
+void picBig_MouseDown(Molvar& m, int button, double x, double y) {
+  if (button != kLeftButton) return;
   m.IconX = static_cast<int16_t>(32 * CellOf(x));
   m.IconY = static_cast<int16_t>(224 - 32 * CellOf(y));
   m.frmIconSelect.MarkerX = m.IconX;

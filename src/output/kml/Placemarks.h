@@ -22,8 +22,9 @@ std::string GoogleMapsIconFile(const Molvar& m);
 void ShowIconPalette(Molvar& m, int16_t choice);
 void optPalette_Click(Molvar& m, int index);
 void chkCustomIcon_Click(Molvar& m);
-// Left-button press on picBig at (x, y) pixels: choose that cell.
-void picBig_MouseDown(Molvar& m, double x, double y);
+inline constexpr int kLeftButton = 1;
+// A press on picBig at (x, y) pixels; the left button chooses that cell, the others do nothing.
+void picBig_MouseDown(Molvar& m, int button, double x, double y);
 void picBig_MouseMove(Molvar& m, double x, double y);
 
 }  // namespace molvar
