@@ -1,32 +1,42 @@
 #include "core/Markup.h"
 
+#include <cstdint>
+
+#include "core/Text.h"
+
 namespace molvar {
 namespace {
 
-bool IsNameChar(char c) {
-  return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || (c >= '0' && c <= '9') || c == '_' ||
-         c == '-' || c == '.';
+bool IsLegalXmlChar(uint32_t c) {
+  return c == 0x9 || c == 0xA || c == 0xD || (c >= 0x20 && c <= 0xD7FF) || (c >= 0xE000 && c <= 0xFFFD) ||
+         (c >= 0x10000 && c <= 0x10FFFF);
 }
 
-bool IsHexDigit(char c) { return (c >= '0' && c <= '9') || (c >= 'a' && c <= 'f') || (c >= 'A' && c <= 'F'); }
-
-// Length of the entity reference ("&name;", "&#123;", "&#x1F;") at the start of `s`, 0 if none.
-std::size_t EntityLength(std::string_view s) {
-  if (s.size() < 3 || s[0] != '&') return 0;
-  std::size_t i = 1;
-  if (s[1] == '#') {
-    i = 2;
-    const bool hex = i < s.size() && (s[i] == 'x' || s[i] == 'X');
-    if (hex) ++i;
-    const std::size_t digitsStart = i;
-    while (i < s.size() && (hex ? IsHexDigit(s[i]) : (s[i] >= '0' && s[i] <= '9'))) ++i;
-    if (i == digitsStart) return 0;
-  } else {
-    const char first = s[1];
-    if (!((first >= 'a' && first <= 'z') || (first >= 'A' && first <= 'Z') || first == '_')) return 0;
-    while (i < s.size() && IsNameChar(s[i])) ++i;
+// Whether `ref` (the text between "&" and ";") is a reference a reader resolves without a DTD:
+// the five predefined entities and character references to legal characters.
+bool IsResolvableReference(std::string_view ref) {
+  if (ref == "amp" || ref == "lt" || ref == "gt" || ref == "quot" || ref == "apos") return true;
+  if (ref.size() < 2 || ref[0] != '#') return false;
+  const bool hex = ref[1] == 'x' || ref[1] == 'X';
+  const std::string_view digits = ref.substr(hex ? 2 : 1);
+  if (digits.empty() || digits.size() > 8) return false;
+  uint32_t value = 0;
+  for (const char c : digits) {
+    uint32_t d = 0;
+    if (c >= '0' && c <= '9') d = static_cast<uint32_t>(c - '0');
+    else if (hex && c >= 'a' && c <= 'f') d = static_cast<uint32_t>(c - 'a' + 10);
+    else if (hex && c >= 'A' && c <= 'F') d = static_cast<uint32_t>(c - 'A' + 10);
+    else return false;
+    value = value * (hex ? 16u : 10u) + d;
   }
-  return (i < s.size() && s[i] == ';') ? i + 1 : 0;
+  return IsLegalXmlChar(value);
+}
+
+// Length of the resolvable reference ("&amp;", "&#176;") at the start of `s`, 0 if none.
+std::size_t EntityLength(std::string_view s) {
+  const std::size_t semicolon = s.find(';');
+  if (s.empty() || s[0] != '&' || semicolon == std::string_view::npos || semicolon > 12) return 0;
+  return IsResolvableReference(s.substr(1, semicolon - 1)) ? semicolon + 1 : 0;
 }
 
 // Length of the well-formed UTF-8 sequence at the start of `s`, 0 if the first byte does not begin one.
@@ -97,6 +107,7 @@ std::string Escape(std::string_view text, Context context, MarkupEncoding encodi
       continue;
     }
     if (c == '<') out += "&lt;";
+    else if (c == '>' && out.size() >= 2 && out.compare(out.size() - 2, 2, "]]") == 0) out += "&gt;";
     else if (c == '"' && context == Context::Attribute) out += "&quot;";
     else out += c;
     ++i;
@@ -114,6 +125,22 @@ std::string MarkupAttribute(std::string_view text, MarkupEncoding encoding) {
 }
 std::string MarkupCdata(std::string_view text, MarkupEncoding encoding) {
   return Escape(text, Context::Cdata, encoding);
+}
+
+std::string MarkupComment(std::string_view text) {
+  // "]]>" is harmless in a comment, so it is kept rather than split the way CDATA needs.
+  std::string s;
+  std::size_t from = 0;
+  while (true) {
+    const std::size_t at = text.find("]]>", from);
+    s += MarkupCdata(text.substr(from, at == std::string_view::npos ? std::string_view::npos : at - from));
+    if (at == std::string_view::npos) break;
+    s += "]]>";
+    from = at + 3;
+  }
+  // "- -" may meet a following "-" again ("---").
+  while (Contains(s, "--")) s = Replace(s, "--", "- -");
+  return s;
 }
 
 }  // namespace molvar

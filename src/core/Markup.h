@@ -1,8 +1,8 @@
 #pragma once
 // Text from outside (titles, names, descriptions, file names) on its way into XML. Only what would
 // break the document is changed: a bare "&", "<", a quote inside an attribute, control characters
-// XML forbids, bytes that are not UTF-8 (taken as Latin-1), and "]]>" inside CDATA. Entity
-// references already in the text ("&amp;", "&#176;") stay as they are.
+// XML forbids, bytes that are not UTF-8 (taken as Latin-1), and "]]>". References a reader resolves
+// without a DTD ("&amp;", "&#176;") stay as they are; any other "&" ("&nbsp;") is escaped.
 #include <string>
 #include <string_view>
 
@@ -18,5 +18,8 @@ std::string MarkupText(std::string_view text, MarkupEncoding encoding = MarkupEn
 std::string MarkupAttribute(std::string_view text, MarkupEncoding encoding = MarkupEncoding::Utf8);
 // The inside of <![CDATA[ ... ]]>.
 std::string MarkupCdata(std::string_view text, MarkupEncoding encoding = MarkupEncoding::Utf8);
+// Text inside a comment between fixed text that neither starts nor ends with "-": legal
+// characters and no "--" (written "- -").
+std::string MarkupComment(std::string_view text);
 
 }  // namespace molvar

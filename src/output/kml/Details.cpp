@@ -5,7 +5,6 @@
 #include "app/Molvar.h"
 #include "core/DateTime.h"
 #include "core/Markup.h"
-#include "output/kml/KmlText.h"
 #include "core/Numbers.h"
 #include "core/Text.h"
 #include "output/kml/KmlFrame.h"
@@ -75,7 +74,7 @@ void WriteDetailedData(Molvar& m) {
     out.Line("  </IconStyle>");
     out.Line("  <BalloonStyle>");
     out.Line("   <text>&lt;b&gt;");
-    out.Line("File " + KmlText(m.OutputName) + " details");
+    out.Line("File " + MarkupText(m.OutputName) + " details");
     out.Line("&lt;/b&gt;&lt;br /&gt;$[description]</text>");
     out.Line("  </BalloonStyle>");
     out.Line("</Style>");

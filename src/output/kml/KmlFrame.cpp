@@ -6,7 +6,6 @@
 #include "core/Text.h"
 #include "output/Dispatch.h"
 #include "output/kml/Details.h"
-#include "output/kml/KmlText.h"
 #include "output/kml/Placemarks.h"
 
 namespace molvar {
@@ -69,9 +68,9 @@ int16_t WriteKmlHeader(Molvar& m) {
     out.Line(std::string("<kml xmlns=\"") + kKmlNamespace + "\">");
     out.Line("<!--  File type " + IntToText(m.ProgramMode) + "-" + IntToText(m.TrackFileType) + "-" +
              IntToText(m.WptFileType) + "-" + IntToText(m.OutputMode) + " created with Molvar version " +
-             CommentText(m.VersionText) + "  -->");
+             MarkupComment(m.VersionText) + "  -->");
     out.Line("<Folder>");
-    out.Line("<name>" + KmlText(GetTrackTitle(m)) + "</name>");
+    out.Line("<name>" + MarkupText(GetTrackTitle(m)) + "</name>");
     if (m.ProgramMode == kModeAgw) out.Line("  <open>1</open>");
     out.Line("");
 
@@ -79,7 +78,7 @@ int16_t WriteKmlHeader(Molvar& m) {
       out.Line("<ScreenOverlay>");
       out.Line("<name>Legend</name>");
       out.Line("<Icon>");
-      out.Line("<href>" + KmlText(m.ProgramPath("SpeedLegend.jpg")) + "</href>");
+      out.Line("<href>" + MarkupText(m.ProgramPath("SpeedLegend.jpg")) + "</href>");
       out.Line("</Icon>");
       out.Line("<overlayXY x= \"0\" y=\"1\" xunits=\"fraction\" yunits=\" fraction\"/>");
       out.Line("<screenXY x=\"0\" y=\" 1\" xunits=\" fraction\" yunits=\" fraction\"/>");
@@ -167,7 +166,7 @@ void WriteLookAt(Molvar& m, double longitude, double latitude, int heading) {
   out.Line("  <longitude>" + DoubleToText(longitude) + "</longitude>");
   out.Line("  <latitude>" + DoubleToText(latitude) + "</latitude>");
   out.Line("  <range>" + FormatPattern(Val(m.frmMain.txtEyeAlt.Text) / m.AltitudeFactor, "0") + "</range>");
-  out.Line("  <tilt>" + KmlText(m.frmMain.txtTilt.Text) + "</tilt>");
+  out.Line("  <tilt>" + MarkupText(m.frmMain.txtTilt.Text) + "</tilt>");
   out.Line("  <heading>" + IntToText(heading) + "</heading>");
   out.Line("</LookAt>");
   out.Line("");

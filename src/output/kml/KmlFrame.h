@@ -5,7 +5,7 @@
 #include <string>
 #include <string_view>
 
-#include "output/kml/KmlText.h"
+#include "core/Markup.h"
 
 namespace molvar {
 

@@ -4,7 +4,6 @@
 
 #include "app/Molvar.h"
 #include "core/Markup.h"
-#include "output/kml/KmlText.h"
 #include "core/Numbers.h"
 #include "core/Text.h"
 #include "core/DateTime.h"
@@ -22,7 +21,7 @@ std::string PaletteLine(int palette) {
 void WriteIconLines(Molvar& m, int16_t kind) {
   OutputFile& out = m.Out;
   if (m.frmIconSelect.chkCustomIcon.Checked()) {
-    out.Line("        <href>" + KmlText(m.ProgramPath("Icons/Custom.png")) + "</href>");
+    out.Line("        <href>" + MarkupText(m.ProgramPath("Icons/Custom.png")) + "</href>");
     return;
   }
   int palette = m.IconPalette, x = m.IconX, y = m.IconY;
@@ -81,7 +80,7 @@ void WriteKmlPlacemark(Molvar& m, std::string_view name, double longitude, doubl
     const bool northUp = SelectedIndex(f.optNorthUp) == 1;
     const int viewHeading = m.ProgramMode == kModeRealTimeNmea && northUp ? 0 : TextBoxInt(f.txtHeading.Text);
 
-    out.Line("<!--  Write \"" + CommentText(name) + "\" Placemark  -->");
+    out.Line("<!--  Write \"" + MarkupComment(name) + "\" Placemark  -->");
     out.Line("<Placemark>");
 
     if (m.Aprs.NearestMode == 1) {
@@ -103,7 +102,7 @@ void WriteKmlPlacemark(Molvar& m, std::string_view name, double longitude, doubl
       WriteSummaryBalloon(m);
     }
 
-    out.Line("  <name>" + KmlText(name) + "</name>");
+    out.Line("  <name>" + MarkupText(name) + "</name>");
     if (m.ProgramMode == kModeConvertWaypoints) {
       out.Line("");
       WriteLookAt(m, longitude, latitude, viewHeading);
@@ -113,7 +112,7 @@ void WriteKmlPlacemark(Molvar& m, std::string_view name, double longitude, doubl
       out.Line("  <styleUrl>root://styleMaps#default?iconId=0x307</styleUrl>");
       out.Line("  <Style>");
       out.Line("    <LabelStyle>");
-      out.Line("      <color>" + Hex2(m.TransparencyLevel) + KmlText(colour) + "</color>");
+      out.Line("      <color>" + Hex2(m.TransparencyLevel) + MarkupText(colour) + "</color>");
       out.Line("    </LabelStyle>");
       out.Line("    <IconStyle>");
       if (f.chkHalfSize.Checked()) out.Line("      <scale>0.5</scale>");

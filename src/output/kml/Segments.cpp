@@ -2,7 +2,6 @@
 
 #include "app/Molvar.h"
 #include "core/Markup.h"
-#include "output/kml/KmlText.h"
 #include "core/Numbers.h"
 #include "core/Text.h"
 #include "output/kml/KmlFrame.h"
@@ -91,7 +90,7 @@ void WriteKmlStyle(Molvar& m, int16_t selector) {
   if (m.OutputMode == kOutputGoogleEarth) {
     out.Line("    <IconStyle>");
     if (m.frmMain.chkHalfSize.Checked()) out.Line("      <scale>0.5</scale>");
-    out.Line("      <Icon><href>" + KmlText(m.ProgramPath("Icons/" + IntToText(VaryColorPtr(m, selector)) + ".png")) +
+    out.Line("      <Icon><href>" + MarkupText(m.ProgramPath("Icons/" + IntToText(VaryColorPtr(m, selector)) + ".png")) +
              "</href></Icon>");
     out.Line("    </IconStyle>");
   }
@@ -112,7 +111,7 @@ void WriteKmlTrackSegment(Molvar& m, int32_t startIndex, int32_t count) {
     const TrackStore& track = m.Track;
     out.Line("<!--  Write segment number " + IntToText(m.Kml.SegmentCount) + "  -->");
     out.Line("<Placemark>");
-    out.Line("  <name>" + KmlText(SegmentTitle(m, startIndex)) + "</name>");
+    out.Line("  <name>" + MarkupText(SegmentTitle(m, startIndex)) + "</name>");
     if (m.OutputMode == kOutputGoogleEarth) out.Line("  <styleUrl>root://styles#default</styleUrl>");
     WriteKmlStyle(m, 0);
     out.Line("  <LineString>");

@@ -7,7 +7,7 @@
 #include <string>
 
 #include "output/kml/KmlFrame.h"
-#include "output/kml/KmlText.h"
+#include "core/Markup.h"
 #include "output/kml/Placemarks.h"
 #include "output/kml/Segments.h"
 #include "core/SpeedDistance.h"
@@ -24,36 +24,36 @@ using testing::WriteTrack;
 
 bool Has(const std::string& text, const std::string& part) { return text.find(part) != std::string::npos; }
 
-TEST(KmlText, EscapesOnlyWhatWouldBreakTheDocument) {
-  EXPECT_EQ(KmlText("Fish & Chips <best> \"q\" 'a'"), "Fish &amp; Chips &lt;best> \"q\" 'a'");
-  EXPECT_EQ(KmlText("Salt &amp; Pepper"), "Salt &amp; Pepper");
-  EXPECT_EQ(KmlText("&lt;&gt;&quot;&apos;&#176;&#xB0;"), "&lt;&gt;&quot;&apos;&#176;&#xB0;");
-  EXPECT_EQ(KmlText("a]]>b"), "a]]&gt;b");
-  EXPECT_EQ(KmlText("a]]]>b ]>"), "a]]]&gt;b ]>");
-  EXPECT_EQ(KmlText("& &; &#; &x"), "&amp; &amp;; &amp;#; &amp;x");
+TEST(MarkupSafety, EscapesOnlyWhatWouldBreakTheDocument) {
+  EXPECT_EQ(MarkupText("Fish & Chips <best> \"q\" 'a'"), "Fish &amp; Chips &lt;best> \"q\" 'a'");
+  EXPECT_EQ(MarkupText("Salt &amp; Pepper"), "Salt &amp; Pepper");
+  EXPECT_EQ(MarkupText("&lt;&gt;&quot;&apos;&#176;&#xB0;"), "&lt;&gt;&quot;&apos;&#176;&#xB0;");
+  EXPECT_EQ(MarkupText("a]]>b"), "a]]&gt;b");
+  EXPECT_EQ(MarkupText("a]]]>b ]>"), "a]]]&gt;b ]>");
+  EXPECT_EQ(MarkupText("& &; &#; &x"), "&amp; &amp;; &amp;#; &amp;x");
 }
 
-TEST(KmlText, ReferencesAReaderCannotResolveAreEscapedAgain) {
-  EXPECT_EQ(KmlText("a&nbsp;b"), "a&amp;nbsp;b");
-  EXPECT_EQ(KmlText("&#0;&#xD800;&#x110000;&#99999999999;"), "&amp;#0;&amp;#xD800;&amp;#x110000;&amp;#99999999999;");
-  EXPECT_EQ(KmlText("&#9;&#x10FFFF;"), "&#9;&#x10FFFF;");
+TEST(MarkupSafety, ReferencesAReaderCannotResolveAreEscapedAgain) {
+  EXPECT_EQ(MarkupText("a&nbsp;b"), "a&amp;nbsp;b");
+  EXPECT_EQ(MarkupText("&#0;&#xD800;&#x110000;&#99999999999;"), "&amp;#0;&amp;#xD800;&amp;#x110000;&amp;#99999999999;");
+  EXPECT_EQ(MarkupText("&#9;&#x10FFFF;"), "&#9;&#x10FFFF;");
 }
 
-TEST(KmlText, ForbiddenCharactersCannotHideAClosingSequence) {
-  EXPECT_EQ(KmlText("]]\x01>"), "]]&gt;");
-  EXPECT_EQ(KmlText("caf\xE9"), "caf\xC3\xA9");  // Latin-1 into UTF-8
+TEST(MarkupSafety, ForbiddenCharactersCannotHideAClosingSequence) {
+  EXPECT_EQ(MarkupText("]]\x01>"), "]]&gt;");
+  EXPECT_EQ(MarkupText("caf\xE9"), "caf\xC3\xA9");  // Latin-1 into UTF-8
 }
 
-TEST(KmlText, CommentsLoseDoubleDashesAndKeepTheRest) {
-  EXPECT_EQ(CommentText("a--b"), "a- -b");
-  EXPECT_EQ(CommentText("a---b-"), "a- - -b-");
-  EXPECT_EQ(CommentText("x ]]> & <y>"), "x ]]> & <y>");
-  EXPECT_EQ(CommentText("bell\x07"), "bell");
+TEST(MarkupSafety, CommentsLoseDoubleDashesAndKeepTheRest) {
+  EXPECT_EQ(MarkupComment("a--b"), "a- -b");
+  EXPECT_EQ(MarkupComment("a---b-"), "a- - -b-");
+  EXPECT_EQ(MarkupComment("x ]]> & <y>"), "x ]]> & <y>");
+  EXPECT_EQ(MarkupComment("bell\x07"), "bell");
 }
 
 constexpr const char* kNasty = "Tom's \"Bar\" & <Grill> ]]> --- &amp; &nbsp;";
 
-TEST(KmlText, TrackDocumentWithHostileTextsStaysReadable) {
+TEST(MarkupSafety, TrackDocumentWithHostileTextsStaysReadable) {
   TestProgram t;
   // A program folder whose name needs escaping too.
   const std::filesystem::path folder = t.folder.path() / "R&D <x> ]]>";
@@ -82,14 +82,14 @@ TEST(KmlText, TrackDocumentWithHostileTextsStaysReadable) {
   EXPECT_TRUE(Has(doc, "<name>Tom's \"Bar\" &amp; &lt;Grill> ]]&gt; --- &amp; &amp;nbsp;</name>")) << doc;
   EXPECT_TRUE(Has(doc, "   <br></br>Tom's \"Bar\" & <Grill> ]]]]><![CDATA[> --- &amp; &nbsp;\r\n")) << doc;
   EXPECT_TRUE(Has(doc, "File a&amp;b &lt;1>.kml details\r\n"));
-  EXPECT_TRUE(Has(doc, "<href>" + KmlText(folder.string()) + "/SpeedLegend.jpg</href>"));
+  EXPECT_TRUE(Has(doc, "<href>" + MarkupText(folder.string()) + "/SpeedLegend.jpg</href>"));
   EXPECT_TRUE(Has(doc, "  <tilt>4&lt;5 &amp; ]]&gt;</tilt>"));
   EXPECT_TRUE(t.platform.Messages().empty());
   ExpectPeersRead(path, {{-75, 45, 0}, {-75, 45.01, 0}, {-75, 45, 0}, {-75, 45.01, 0}, {-75, 45.01, 0}},
                   {{{-75, 45, 0}, {-75, 45.01, 0}}});
 }
 
-TEST(KmlText, GoogleMapsSegmentNamesAndWaypointNamesStayReadable) {
+TEST(MarkupSafety, GoogleMapsSegmentNamesAndWaypointNamesStayReadable) {
   TestProgram t;
   Molvar& m = *t;
   t.AddPoint(45.0, -75.0, "2007-05-01 10:00:00 AM");
