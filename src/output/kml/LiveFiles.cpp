@@ -107,15 +107,15 @@ void WriteGpsLinkFile(Molvar& m) {
 
 void WriteWebLinkFile(Molvar& m) {
   try {
-    WriteLinkFile(
-        m, {"gpslink.kml",
-            kLinkNamespace20,
-            false,
-            m.FtpHttpPath + "nmea.kml",
-            38,
-            {"<!--  This file may be modified to suit your own preferences.                    -->",
-             "<!--  If you modify it, save it as a different name, else it will get overwritten.        -->",
-             "<!--  The <href> line must point to your server. See the help file for <refreshInterval>. -->"}});
+    WriteLinkFile(m,
+                  {"gpslink.kml",
+                   kLinkNamespace20,
+                   false,
+                   m.FtpHttpPath + "nmea.kml",
+                   38,
+                   {"<!--  This file may be modified to suit your own preferences.                    -->",
+                    "<!--  If you modify it, save it as a different name, else it will get overwritten.        -->",
+                    "<!--  The <href> line must point to your server. See the help file for <refreshInterval>. -->"}});
   } catch (const std::exception& e) {
     ShowBug(m, "WriteWebLinkFile", e);
   }

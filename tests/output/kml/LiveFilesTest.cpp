@@ -1,7 +1,5 @@
 // The live files of real-time mode against hand-written files, the per-fix rewrite with its
 // guards, the automatic upload decisions, and the old nmea.kml surviving a failed rewrite.
-#include "output/kml/LiveFiles.h"
-
 #include <gtest/gtest.h>
 #include <sys/resource.h>
 
@@ -13,6 +11,7 @@
 
 #include "core/Text.h"
 #include "input/Nmea.h"
+#include "output/kml/LiveFiles.h"
 #include "support/Peers.h"
 #include "support/TestProgram.h"
 
@@ -121,7 +120,8 @@ TEST(LiveLinkFiles, RefreshIntervalIsTheLeadingWholeNumberOfTheBox) {
     WriteGpsLinkFile(*t);
     const std::string kml = ReadFile(path);
     EXPECT_NE(kml.find("\r\n    <refreshInterval>" + interval + "</refreshInterval>\r\n"), std::string::npos)
-        << text << "\n" << kml;
+        << text << "\n"
+        << kml;
     EXPECT_EQ(kml.find("<refreshMode>onInterval</refreshMode>") != std::string::npos, onInterval) << text;
   }
 }
@@ -183,9 +183,10 @@ TEST(LiveNmeaKml, ThreeFixesWriteTheHandWrittenDocument) {
   const std::string ogr = RunCommand("ogrinfo -ro -al '" + path + "' 2>&1", &rc);
   EXPECT_EQ(rc, 0) << ogr;
   EXPECT_EQ(ogr.find("ERROR"), std::string::npos) << ogr;
-  ExpectInOrder(ogr, {"Start  10:00:00 AM", "POINT Z (-75 45 0)", "Finish  10:00:20 AM 2.22 km", "POINT Z (-75 45.02 0)",
-                      "Fastest (18.5 kph at point 2)", "12.3 kph  Alt: 3 feet  Hdg: 45\xC2\xB0", "Track - 3 points",
-                      "LINESTRING Z (-75 45 1,-75 45.01 1,-75 45.02 1)"});
+  ExpectInOrder(ogr,
+                {"Start  10:00:00 AM", "POINT Z (-75 45 0)", "Finish  10:00:20 AM 2.22 km", "POINT Z (-75 45.02 0)",
+                 "Fastest (18.5 kph at point 2)", "12.3 kph  Alt: 3 feet  Hdg: 45\xC2\xB0", "Track - 3 points",
+                 "LINESTRING Z (-75 45 1,-75 45.01 1,-75 45.02 1)"});
 }
 
 TEST(LiveNmeaKml, GoogleEarthFollowsTheLinkToAReadableFile) {
@@ -332,6 +333,26 @@ TEST(LiveRewrite, NothingIsWrittenWithoutANewPoint) {
   EXPECT_EQ(m.Out.CompletedCount(), written);
   EXPECT_EQ(m.Track.PointCount, 1);
   EXPECT_TRUE(t.platform.Messages().empty());
+}
+
+TEST(LiveRewrite, AReaderInTheMiddleOfTheFileKeepsReadingTheOldOne) {
+  Live t;
+  t.Fixes(2);
+  const std::string before = ReadFile(t.NmeaKml());
+  // Google Earth has started reading when the next fix arrives.
+  std::FILE* reader = std::fopen(t.NmeaKml().c_str(), "rb");
+  ASSERT_NE(reader, nullptr);
+  std::string seen(100, '\0');
+  ASSERT_EQ(std::fread(seen.data(), 1, seen.size(), reader), seen.size());
+  t.Fixes(1);
+  char chunk[4096];
+  for (size_t n; (n = std::fread(chunk, 1, sizeof chunk, reader)) > 0;) seen.append(chunk, n);
+  std::fclose(reader);
+  EXPECT_EQ(seen, before);
+  const std::string after = ReadFile(t.NmeaKml());
+  EXPECT_NE(after, before);
+  EXPECT_NE(after.find("<name>Track - 3 points</name>"), std::string::npos);
+  EXPECT_TRUE(after.ends_with("</Folder>\r\n</kml>\r\n"));
 }
 
 TEST(LiveRewrite, AFailedHeadIsReportedAndTheSameCountIsTriedAgain) {
