@@ -1,6 +1,5 @@
 #include "output/kml/LiveFiles.h"
 
-#include <string_view>
 
 #include "app/Molvar.h"
 #include "core/Markup.h"
