@@ -1,6 +1,5 @@
 #include "output/kml/LiveFiles.h"
 
-
 #include "app/Molvar.h"
 #include "core/Markup.h"
 #include "core/Numbers.h"
