@@ -5,6 +5,7 @@
 #include <array>
 #include <cstdint>
 #include <fstream>
+#include <functional>
 #include <string>
 
 #include "app/Form.h"
@@ -113,6 +114,10 @@ struct Molvar {
   double FtpUploadRate = 0;
   int16_t FtpReady = 0;
   std::string EmailSignature;
+  // The FTP module's upload of the last saved output file: count 0 for a manual upload, else the
+  // running number of automatic uploads. The writers decide when; the FTP module installs it, and
+  // while it is empty there is nothing to upload to.
+  std::function<void(Molvar&, int32_t count)> UploadLastFile;
 
   // The one output file of the writers
   OutputFile Out;
