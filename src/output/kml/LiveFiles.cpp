@@ -50,7 +50,7 @@ void WriteLinkFile(Molvar& m, const LinkFileText& t) {
   file.Line("</NetworkLink>");
   file.Line("</kml>");
   file.Line("");
-  file.Line("<!--  File created with Molvar version " + CommentText(m.VersionText) +
+  file.Line("<!--  File created with Molvar version " + MarkupComment(m.VersionText) +
             std::string(static_cast<std::size_t>(t.versionPadding), ' ') + "-->");
   for (const char* comment : t.comments) file.Line(comment);
   file.Close();
