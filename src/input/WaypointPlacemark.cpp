@@ -1,10 +1,16 @@
+#include "app/Molvar.h"
 #include "input/XmlTracks.h"
+#include "output/kml/Placemarks.h"
 
 namespace molvar {
 
-// The one place where a waypoint read from a markup file meets the KML placemark writer:
-// WriteKmlPlacemark(m, label, longitude, latitude, altitude, "FFFFFF", kind 0).
-// Until that writer is part of the program the waypoint is only stored.
-void WriteWaypointPlacemark(Molvar&, std::string&, double&, double&, int32_t&) {}
+// The one place where a waypoint just read meets the writer of the chosen output.
+void WriteWaypointPlacemark(Molvar& m, std::string& label, double& longitude, double& latitude,
+                            int32_t& altitude) {
+  switch (m.OutputFormat) {
+    case kFormatKml: WriteKmlPlacemark(m, label, longitude, latitude, altitude, "FFFFFF", kPlacemarkGeneral); return;
+    default: return;
+  }
+}
 
 }  // namespace molvar
