@@ -550,6 +550,22 @@ TEST(ReadKmlCoordinateLine, ReadsOneLineTracks) {
   EXPECT_EQ(f.At(3).Altitude, 120);
 }
 
+// Our own KML writer's track, from its hand-written expected file: each segment repeats the point
+// where the previous one ended, and that point is read again.
+TEST(ReadKmlCoordinateLine, ReadsOurOwnSegments) {
+  MarkupFile f(6);
+  f.KmlFile(testing::FileLines(std::string(MOLVAR_GOLDEN_DIR) + "/kml/track_speed_details.kml"));
+  ASSERT_EQ(f->Track.PointCount, 4);
+  const double lat[] = {45, 45.01, 45.01, 45.02};
+  const int32_t alt[] = {0, 1100, 1100, 1300};
+  for (int i = 0; i < 4; ++i) {
+    EXPECT_DOUBLE_EQ(f.At(i + 1).Longitude, -75);
+    EXPECT_DOUBLE_EQ(f.At(i + 1).Latitude, lat[i]);
+    EXPECT_EQ(f.At(i + 1).Altitude, alt[i]);
+  }
+  EXPECT_NEAR(f.At(4).Distance, 2.2239784, 1e-9);
+}
+
 // ---- CDATA
 
 TEST(StripCdata, RemovesTheWrapper) {
