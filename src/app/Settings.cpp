@@ -1,6 +1,7 @@
 #include "app/Settings.h"
 
 #include <array>
+#include <filesystem>
 #include <initializer_list>
 #include <cerrno>
 #include <cstdio>
@@ -413,12 +414,14 @@ void ReadSettingsFile(Molvar& m) {
   }
 }
 
-void ApplyLoadedSettings(Molvar& m) {
-  auto& f = m.frmMain;
+void OpenAgwpeFile(Molvar& m) {
   m.AgwpeFile.close();
   m.AgwpeFile.clear();
   m.AgwpeFile.open(m.ProgramPath(kAgwpeFileName), std::ios::out | std::ios::trunc | std::ios::binary);
+}
 
+void ApplyLoadedSettings(Molvar& m) {
+  auto& f = m.frmMain;
   f.window.Left = f.window.Left < 0 ? 0 : (f.window.Left > 8000 ? 8000 : f.window.Left);
   f.window.Top = f.window.Top < 0 ? 0 : (f.window.Top > 5000 ? 5000 : f.window.Top);
 
@@ -450,8 +453,6 @@ void ApplyLoadedSettings(Molvar& m) {
 
   ApplyAutoOpen(m);
   ApplyGain(m);
-
-  LoadTrackData(m);
 }
 
 // One point line of TrackData.txt into `p`; false when the line is not a complete point.
@@ -492,6 +493,14 @@ const std::string& SettingsLabel(int k) { return kLabels.at(static_cast<std::siz
 void LoadSettings(Molvar& m) {
   ApplySettingDefaults(m);
   ReadSettingsFile(m);
+  OpenAgwpeFile(m);
+  ApplyLoadedSettings(m);
+  LoadTrackData(m);
+}
+
+void LoadOptionsOnly(Molvar& m) {
+  ApplySettingDefaults(m);
+  if (std::filesystem::exists(m.ProgramPath(kSettingsFileName))) ReadSettingsFile(m);
   ApplyLoadedSettings(m);
 }
 

@@ -18,6 +18,9 @@ const std::string& SettingsLabel(int k);
 // Start-up: defaults, then Molvar.ini, then applying the values to the window the way user clicks
 // would, then LoadTrackData. Problems are reported in a message box and start-up goes on.
 void LoadSettings(Molvar& m);
+// The options of Molvar.ini (or the defaults when there is none) without touching any file and
+// without the welcome message or the last track: for the command-line converter.
+void LoadOptionsOnly(Molvar& m);
 // Shutdown: rewrites Molvar.ini in full. Returns false (and leaves the old file) when it could not
 // be written.
 bool SaveSettings(Molvar& m);

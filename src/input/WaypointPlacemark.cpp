@@ -1,5 +1,7 @@
 #include "app/Molvar.h"
 #include "input/XmlTracks.h"
+#include "output/Gpx.h"
+#include "output/Ozi.h"
 #include "output/kml/Placemarks.h"
 
 namespace molvar {
@@ -9,7 +11,8 @@ void WriteWaypointPlacemark(Molvar& m, std::string& label, double& longitude, do
                             int32_t& altitude) {
   switch (m.OutputFormat) {
     case kFormatKml: WriteKmlPlacemark(m, label, longitude, latitude, altitude, "FFFFFF", kPlacemarkGeneral); return;
-    default: return;
+    case kFormatGpx: WriteGpxWaypoint(m, m.Waypoints.WptCount); return;
+    default: WriteOziWaypoint(m, m.Waypoints.WptCount); return;
   }
 }
 

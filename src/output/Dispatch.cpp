@@ -1,6 +1,13 @@
 #include "output/Dispatch.h"
 
 #include "app/Molvar.h"
+#include "core/Numbers.h"
+#include "core/SpeedDistance.h"
+#include "output/Gpx.h"
+#include "output/Ozi.h"
+#include "output/kml/KmlFrame.h"
+#include "output/kml/Placemarks.h"
+#include "output/kml/Segments.h"
 
 namespace molvar {
 namespace {
@@ -73,5 +80,70 @@ void OpenOutput(Molvar& m) {
 }
 
 void LocateGoogleEarth(Molvar& m) { OpenInGoogleEarth(m, true); }
+
+void WriteOutputFile(Molvar& m) {
+  if (m.Track.PointCount == 0) {
+    m.frmMain.txtInfo.Text = " No track data found - no file saved.";
+    return;
+  }
+  MarkDays(m);
+  MarkSegments(m);
+  m.Speed.FastestIndex = FindFastestPoint(m);
+  if (m.ProgramMode == kModeAprsWeb) {
+    m.OutputName = m.Aprs.StationCallSign + ".kml";
+    // Without a remembered track folder the file goes to the program folder, not the root.
+    m.OutputPath = m.OutputTrackPath.empty() ? m.ProgramPath(m.OutputName) : m.OutputTrackPath + "/" + m.OutputName;
+  }
+  m.Kml.SegmentCount = 1;
+  if (m.OutputFormat == kFormatKml) {
+    if (WriteKmlHeader(m) != 0) return;
+    WriteKmlSegments(m);
+    WriteKmlFooter(m);
+    return;
+  }
+  try {
+    if (m.OutputFormat == kFormatGpx) {
+      WriteGpxHeader(m);
+      WriteGpxSegments(m);
+      WriteGpxFooter(m);
+    } else {
+      WriteOziHeader(m, kOziTrack);
+      for (int32_t i = 1; i <= m.Track.StoredCount(); ++i) WriteOziTrackPoint(m, i);
+      m.Out.Close();
+      // As the GPX tail does, so the status line names what was written.
+      m.frmMain.txtInfo.Text += " Output: " + m.OutputName;
+    }
+  } catch (const std::exception& e) {
+    // The previous file at OutputPath stays as it was.
+    m.Out.Abandon();
+    ShowBug(m, "WriteOutputFile", e);
+  }
+}
+
+void RefreshOutput(Molvar& m) {
+  if (m.ProgramMode != kModeConvertWaypoints) {
+    WriteOutputFile(m);
+    return;
+  }
+  WaypointStore& waypoints = m.Waypoints;
+  if (waypoints.WptCount == 0) {
+    m.platform.MsgBox("No waypoint data available.\r\nPlease load a waypoint file first.", " Sorry!...",
+                      MsgButtons::OK, MsgIcon::Information);
+    return;
+  }
+  // Waypoints are always redrawn as KML.
+  m.OutputFormat = kFormatKml;
+  if (WriteKmlHeader(m) != 0) return;
+  const int32_t altitude = RoundToInt32Or(Val(m.frmMain.txtEyeAlt.Text) / m.AltitudeFactor, 0);
+  for (int32_t i = 1; i <= waypoints.WptCount; ++i) {
+    Waypoint& w = waypoints.at(i);
+    w.WptAltitude = altitude;
+    const std::string& label = m.PlacemarkLabelSource == 1   ? w.WptComment
+                               : m.PlacemarkLabelSource == 2 ? w.WptDescription
+                                                             : w.WptName;
+    WriteKmlPlacemark(m, label, w.WptLongitude, w.WptLatitude, w.WptAltitude, "FFFFFF", kPlacemarkGeneral);
+  }
+  WriteKmlFooter(m);
+}
 
 }  // namespace molvar

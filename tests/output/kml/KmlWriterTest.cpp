@@ -2,20 +2,22 @@
 #include <gtest/gtest.h>
 
 #include <array>
-#include <cstdio>
-#include <memory>
 
 #include "core/Numbers.h"
 #include "core/SpeedDistance.h"
 #include "core/Text.h"
 #include "output/kml/KmlFrame.h"
 #include "output/kml/Segments.h"
+#include "support/Peers.h"
 #include "support/TestProgram.h"
 
 namespace molvar {
 namespace {
 
+using testing::ExpectInOrder;
+using testing::ExpectWellFormedXml;
 using testing::ReadFile;
+using testing::RunCommand;
 using testing::TestProgram;
 
 std::string Golden(const std::string& name, const std::string& folder) {
@@ -36,34 +38,16 @@ void WriteTrack(TestProgram& t, const std::string& name) {
   WriteKmlFooter(m);
 }
 
-std::string Run(const std::string& command, int* status = nullptr) {
-  std::string out;
-  std::unique_ptr<FILE, int (*)(FILE*)> pipe(popen(command.c_str(), "r"), pclose);
-  if (!pipe) return out;
-  std::array<char, 4096> buf{};
-  std::size_t n = 0;
-  while ((n = fread(buf.data(), 1, buf.size(), pipe.get())) > 0) out.append(buf.data(), n);
-  const int rc = pclose(pipe.release());
-  if (status != nullptr) *status = rc;
-  return out;
-}
-
 // xmllint, GDAL and gpsbabel all read the file, and the coordinates come back in order.
 void ExpectPeersRead(const std::string& path, const std::vector<std::string>& lonLatInOrder) {
+  ExpectWellFormedXml(path);
+
   int rc = -1;
-  Run("xmllint --noout '" + path + "' 2>&1", &rc);
-  EXPECT_EQ(rc, 0) << Run("xmllint --noout '" + path + "' 2>&1");
-
-  const std::string ogr = Run("ogrinfo -ro -al '" + path + "' 2>&1", &rc);
+  const std::string ogr = RunCommand("ogrinfo -ro -al '" + path + "' 2>&1", &rc);
   EXPECT_EQ(rc, 0) << ogr;
-  std::size_t at = 0;
-  for (const auto& ll : lonLatInOrder) {
-    const std::size_t found = ogr.find(ll, at);
-    EXPECT_NE(found, std::string::npos) << ll << " not in order in:\n" << ogr;
-    if (found != std::string::npos) at = found;
-  }
+  ExpectInOrder(ogr, lonLatInOrder);
 
-  const std::string babel = Run("gpsbabel -i kml -f '" + path + "' -o unicsv -F - 2>&1", &rc);
+  const std::string babel = RunCommand("gpsbabel -i kml -f '" + path + "' -o unicsv -F - 2>&1", &rc);
   EXPECT_EQ(rc, 0) << babel;
   EXPECT_NE(babel.find("Latitude"), std::string::npos) << babel;
 }
