@@ -9,6 +9,7 @@
 #include "core/SpeedDistance.h"
 #include "core/Text.h"
 #include "support/PeerFiles.h"
+#include "support/Peers.h"
 #include "support/TestProgram.h"
 
 namespace molvar {
@@ -278,12 +279,7 @@ TEST(ReadGpxLineWaypoints, ReadsWaypointsWrittenByGpsbabel) {
   EXPECT_EQ(f.Wpt(3).WptComment, "third");
   // One placemark per waypoint, labelled with its name.
   const std::string kml = f.Output();
-  std::size_t from = 0;
-  for (const char* name : {"<name>P1</name>", "<name>P2</name>", "<name>P3</name>"}) {
-    const auto at = kml.find(name, from);
-    ASSERT_NE(at, std::string::npos) << name;
-    from = at + 1;
-  }
+  testing::ExpectInOrder(kml, {"<name>P1</name>", "<name>P2</name>", "<name>P3</name>"});
   EXPECT_NE(kml.find("<longitude>-75.21</longitude>"), std::string::npos);
   EXPECT_NE(kml.find("<color>FFFFFFFF</color>"), std::string::npos);  // white label
   EXPECT_TRUE(f.platform.Messages().empty());

@@ -1,8 +1,7 @@
 #include "support/PeerFiles.h"
 
-#include <cstdlib>
-
 #include "input/LineReader.h"
+#include "support/Peers.h"
 
 namespace molvar::testing {
 
@@ -14,7 +13,9 @@ std::string WriteWithGpsbabel(const TempFolder& folder, std::string_view csv, st
   std::string cmd = "gpsbabel -i unicsv -f '" + in + "'";
   if (asTrack) cmd += " -x transform,trk=wpt,del";
   cmd += " -o " + std::string(output) + " -F '" + out + "' >/dev/null 2>&1";
-  if (std::system(cmd.c_str()) != 0) return {};
+  int status = -1;
+  RunCommand(cmd, &status);
+  if (status != 0) return {};
   return out;
 }
 
