@@ -1,11 +1,10 @@
 #include "input/AprsText.h"
 
-#include <cmath>
-
 #include "app/Molvar.h"
 #include "core/Numbers.h"
 #include "core/SpeedDistance.h"
 #include "core/Text.h"
+#include "input/Nmea.h"
 #include "input/ReaderCommon.h"
 
 namespace molvar {
@@ -14,25 +13,15 @@ namespace {
 
 constexpr double kFeetPerMetre = 3.28083;
 
-// Degrees and minutes ("4530.00") with a hemisphere letter as signed decimal degrees.
-// TODO(merge): the NMEA module's ConvertNmeaLocation does the same; call it once both are in.
-double DegreesFromDdmm(std::string_view text, std::string_view hemisphere) {
-  const double v = Val(text) / 100;
-  const double d = std::floor(v);
-  double result = d + (v - d) * 100 / 60;
-  if (hemisphere == "S" || hemisphere == "W") result = -result;
-  return result;
-}
-
 // The position of a report, or false when the text holds none.
 bool FindAprsPosition(Molvar& m, std::string_view text) {
   const long p = InStr(text, ".");
   if (p < 5 || static_cast<long>(text.size()) <= p + 12) return false;
   const std::string_view latHemisphere = Mid(text, p + 3, 1);
-  m.Nmea.NmeaLatitude = DegreesFromDdmm(Mid(text, p - 4, 7), latHemisphere);
+  m.Nmea.NmeaLatitude = ConvertNmeaLocation(Mid(text, p - 4, 7), latHemisphere);
   if (m.Nmea.NmeaLatitude == 0 || (latHemisphere != "N" && latHemisphere != "S")) return false;
   const std::string_view lonHemisphere = Mid(text, p + 13, 1);
-  m.Nmea.NmeaLongitude = DegreesFromDdmm(Mid(text, p + 5, 8), lonHemisphere);
+  m.Nmea.NmeaLongitude = ConvertNmeaLocation(Mid(text, p + 5, 8), lonHemisphere);
   return m.Nmea.NmeaLongitude != 0 && (lonHemisphere == "E" || lonHemisphere == "W");
 }
 

@@ -39,7 +39,7 @@ void CheckTimestampOrder(Molvar& m, std::string_view newTime, bool dropLastFour,
   text.append(IntToText(count));
   text.append(") in file ");
   text.append(m.InputName);
-  text.append(". \nPlease check your input file for this, and possibly other, errors.\n"
+  text.append(". \r\nPlease check your input file for this, and possibly other, errors.\r\n"
               "Consider deleting the bad line and loading the file again.");
   m.platform.MsgBox(text, " Bad timestamp in input file", MsgButtons::OK, MsgIcon::Exclamation);
   warned = 1;

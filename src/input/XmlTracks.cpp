@@ -1,6 +1,6 @@
 #include "input/XmlTracks.h"
 
-#include <vector>
+#include <array>
 
 #include "app/Molvar.h"
 #include "core/DateTime.h"
@@ -133,34 +133,75 @@ void ReadMarkupLine(Molvar& m, MarkupReaderState& s, const MarkupVocabulary& tag
 
 bool IsWhite(char c) { return c == ' ' || c == '\t' || c == '\r' || c == '\n'; }
 
-bool HasValue(std::string_view s) {
-  for (const char c : s) {
-    if (!IsWhite(c)) return true;
-  }
-  return false;
-}
-
 std::string_view TrimWhite(std::string_view s) {
   while (!s.empty() && IsWhite(s.front())) s.remove_prefix(1);
   while (!s.empty() && IsWhite(s.back())) s.remove_suffix(1);
   return s;
 }
 
-void StoreKmlTuple(Molvar& m, std::string_view lon, std::string_view lat, std::string_view alt,
-                   bool lastOfLine) {
+struct KmlTuple {
   double longitude = 0;
   double latitude = 0;
-  // Only tuples with a real position become points.
-  if (!TryParseNumber(TrimWhite(lon), longitude) || !TryParseNumber(TrimWhite(lat), latitude)) {
-    return;
-  }
+  int32_t altitude = 0;
+};
+
+// A tuple with a real position; false for anything else (white space only, words).
+bool ParseKmlTuple(const std::array<std::string_view, 3>& field, KmlTuple& tuple) {
+  if (!TryParseNumber(TrimWhite(field[0]), tuple.longitude)) return false;
+  if (!TryParseNumber(TrimWhite(field[1]), tuple.latitude)) return false;
+  tuple.altitude = WholeNumberOr0(TrimWhite(field[2]));
+  return true;
+}
+
+void StoreKmlTuple(Molvar& m, const KmlTuple& tuple) {
   TrackPoint& p = AppendTrackPoint(m);
-  p.Longitude = longitude;
-  p.Latitude = latitude;
-  p.Altitude = WholeNumberOr0(TrimWhite(alt));
+  p.Longitude = tuple.longitude;
+  p.Latitude = tuple.latitude;
+  p.Altitude = tuple.altitude;
   CalcSpeedDistance(m, m.Track.PointCount);
-  // The driver bands the last point a line adds; the others are banded here.
-  if (!lastOfLine && m.ColorVaryMode == 3) AssignSpeedBand(m, m.Track.PointCount);
+}
+
+// Calls `take` for each "lon,lat,alt" tuple of the line. A comma moves to the next field and, after
+// the altitude, ends the tuple; white space after a value ends it too unless a comma comes next
+// (blanks around the commas of one tuple). One pass, so no line is too long for it.
+template <typename Take>
+void SplitKmlTuples(std::string_view line, Take take) {
+  std::array<std::string_view, 3> field{};
+  std::size_t index = 0;       // field being collected
+  std::size_t fieldStart = 0;
+  bool tupleHasValue = false;  // a character other than white space since the tuple began
+  bool fieldHasValue = false;
+  bool gap = false;            // white space after a value
+  auto closeTuple = [&](std::size_t end) {
+    field[index] = line.substr(fieldStart, end - fieldStart);
+    if (tupleHasValue) take(field);
+    field = {};
+    index = 0;
+    tupleHasValue = fieldHasValue = gap = false;
+  };
+  for (std::size_t i = 0; i < line.size(); ++i) {
+    const char c = line[i];
+    if (c == ',') {
+      gap = false;
+      if (index == 2) {
+        closeTuple(i);
+      } else {
+        field[index] = line.substr(fieldStart, i - fieldStart);
+        ++index;
+        fieldHasValue = false;
+      }
+      fieldStart = i + 1;
+    } else if (IsWhite(c)) {
+      if (fieldHasValue) gap = true;
+    } else {
+      if (gap) {
+        closeTuple(i);
+        fieldStart = i;
+      }
+      tupleHasValue = fieldHasValue = true;
+    }
+  }
+  closeTuple(line.size());
 }
 
 }  // namespace
@@ -172,54 +213,21 @@ void ReadXmlLine(Molvar& m, std::string_view line) { ReadMarkupLine(m, m.XmlRead
 void ReadKmlCoordinateLine(Molvar& m, std::string_view line) {
   if (line.empty() || Contains(line, "<")) return;
   try {
-    struct Tuple {
-      std::string_view field[3];
-    };
-    std::vector<Tuple> tuples;
-    Tuple current;
-    int index = 0;  // field being collected
-    std::size_t fieldStart = 0;
-    bool any = false;  // the tuple holds a character other than white space
-    auto closeField = [&](std::size_t end) {
-      current.field[index] = line.substr(fieldStart, end - fieldStart);
-    };
-    auto closeTuple = [&](std::size_t end) {
-      closeField(end);
-      if (any) tuples.push_back(current);
-      current = Tuple{};
-      index = 0;
-      any = false;
-    };
-    for (std::size_t i = 0; i < line.size(); ++i) {
-      const char c = line[i];
-      if (c == ',') {
-        if (index == 2) {
-          closeTuple(i);
-        } else {
-          closeField(i);
-          ++index;
-        }
-        fieldStart = i + 1;
-      } else if (IsWhite(c)) {
-        // White space after a value starts the next tuple, unless a comma follows it (blanks
-        // around commas inside one tuple).
-        std::size_t next = i;
-        while (next < line.size() && IsWhite(line[next])) ++next;
-        if (HasValue(line.substr(fieldStart, i - fieldStart)) && next < line.size() &&
-            line[next] != ',') {
-          closeTuple(i);
-          fieldStart = next;
-          i = next - 1;
-        }
-      } else {
-        any = true;
+    // Each point is stored when the next one is found: the driver bands the last point a line
+    // adds, the others are banded here.
+    bool pending = false;
+    KmlTuple last;
+    SplitKmlTuples(line, [&](const std::array<std::string_view, 3>& field) {
+      KmlTuple tuple;
+      if (!ParseKmlTuple(field, tuple)) return;
+      if (pending) {
+        StoreKmlTuple(m, last);
+        if (m.ColorVaryMode == 3) AssignSpeedBand(m, m.Track.PointCount);
       }
-    }
-    closeTuple(line.size());
-    for (std::size_t t = 0; t < tuples.size(); ++t) {
-      const Tuple& tu = tuples[t];
-      StoreKmlTuple(m, tu.field[0], tu.field[1], tu.field[2], t + 1 == tuples.size());
-    }
+      last = tuple;
+      pending = true;
+    });
+    if (pending) StoreKmlTuple(m, last);
   } catch (const std::exception& e) {
     ShowSnag(m, "ReadKmlCoordinateLine", e);
   }
