@@ -6,6 +6,7 @@
 #include "input/TrackReader.h"
 #include "input/Waypoints.h"
 #include "output/Dispatch.h"
+#include "output/kml/LiveFiles.h"
 
 namespace molvar {
 namespace {
@@ -147,6 +148,16 @@ void optWptFileType_Click(Molvar& m, int index) { SelectWptFileType(m, index); }
 void sldrGain_Change(Molvar& m) { ApplyGain(m); }
 void sldrFade_Change(Molvar& m) { ApplyFade(m); }
 void txtGMT_Change(Molvar& m) { ApplyGmtText(m); }
+
+void txtGErefresh_Change(Molvar& m) {
+  WriteGpsLinkFile(m);
+  if (m.OutputName != "nmea.kml") return;
+  try {
+    m.platform.StartProgram(m.GoogleEarthPath + " \"" + m.ProgramPath("gps.kml") + "\"");
+  } catch (const std::exception&) {
+    // Google Earth not found: the link file is written and "Open in GE" can locate the program.
+  }
+}
 
 void mnuOnTop_Click(Molvar& m) {
   MenuItem& item = m.frmMain.mnuOnTop;

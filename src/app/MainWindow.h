@@ -27,6 +27,8 @@ void optWptFileType_Click(Molvar& m, int index);
 void sldrGain_Change(Molvar& m);
 void sldrFade_Change(Molvar& m);
 void txtGMT_Change(Molvar& m);
+// Every edit of the refresh rate rewrites gps.kml; in real-time output Google Earth reopens it.
+void txtGErefresh_Change(Molvar& m);
 
 // Menus.
 void mnuOnTop_Click(Molvar& m);

@@ -75,8 +75,11 @@ void OpenOutput(Molvar& m) {
                       MsgIcon::Information);
     return;
   }
-  // The upload (FtpReady) and the FTP setup window belong to the FTP module, which hooks in here.
-  if (m.FtpReady == 0) m.frmFtpSetup.window.Visible = true;
+  if (m.FtpReady == 0) {
+    m.frmFtpSetup.window.Visible = true;
+  } else if (m.UploadLastFile) {
+    m.UploadLastFile(m, 0);
+  }
 }
 
 void LocateGoogleEarth(Molvar& m) { OpenInGoogleEarth(m, true); }
