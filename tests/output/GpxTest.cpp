@@ -10,6 +10,7 @@
 #include "core/Text.h"
 #include "output/kml/KmlFrame.h"
 #include "output/kml/Segments.h"
+#include "output/Dispatch.h"
 #include "support/Peers.h"
 #include "support/TestProgram.h"
 
@@ -24,18 +25,13 @@ using testing::TestProgram;
 
 std::string Golden(const std::string& name) { return ReadFile(std::string(MOLVAR_GOLDEN_DIR) + "/gpx/" + name); }
 
-// What the dispatcher does for a GPX track.
+// A GPX track through the dispatcher.
 void WriteTrack(TestProgram& t, const std::string& name) {
   Molvar& m = *t;
   m.OutputPath = t.folder.File(name);
   m.OutputName = name;
-  MarkDays(m);
-  MarkSegments(m);
-  m.Speed.FastestIndex = FindFastestPoint(m);
-  m.Kml.SegmentCount = 1;
-  WriteGpxHeader(m);
-  WriteGpxSegments(m);
-  WriteGpxFooter(m);
+  m.OutputFormat = kFormatGpx;
+  WriteOutputFile(m);
 }
 
 void AddPoint(TestProgram& t, double lat, double lon, const char* time, int32_t altitude) {

@@ -9,6 +9,7 @@
 #include "core/SpeedDistance.h"
 #include "core/Text.h"
 #include "input/OziTrack.h"
+#include "output/Dispatch.h"
 #include "support/Peers.h"
 #include "support/TestProgram.h"
 
@@ -26,17 +27,13 @@ std::string_view TrimCr(std::string_view line) {
 
 std::string Golden(const std::string& name) { return ReadFile(std::string(MOLVAR_GOLDEN_DIR) + "/ozi/" + name); }
 
-// What the dispatcher does for an Ozi track.
+// A Ozi track through the dispatcher.
 void WriteTrack(TestProgram& t, const std::string& name) {
   Molvar& m = *t;
   m.OutputPath = t.folder.File(name);
   m.OutputName = name;
-  MarkDays(m);
-  MarkSegments(m);
-  m.Speed.FastestIndex = FindFastestPoint(m);
-  WriteOziHeader(m, kOziTrack);
-  for (int32_t i = 1; i <= m.Track.PointCount; ++i) WriteOziTrackPoint(m, i);
-  m.Out.Close();
+  m.OutputFormat = kFormatOzi;
+  WriteOutputFile(m);
 }
 
 // Three points over local midnight, two hours ahead of GMT, titled Lake.
