@@ -31,5 +31,8 @@ test-asan: build-asan
 
 test: test-release test-asan
 
+bench: build
+	@bench/run.sh $(BUILD)
+
 clean:
 	rm -rf $(BUILD) $(ASAN_BUILD)
