@@ -34,6 +34,16 @@ std::string ReadWholeFile(const std::string& path) {
   return std::string(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
 }
 
+// Whether the text before the first CR (or the end) is longer than kLongFirstLine.
+bool FirstLineIsLong(const std::string& path) {
+  std::ifstream in(path, std::ios::binary);
+  if (!in) throw RuntimeError(kErrFileNotFound, "File not found: " + path);
+  std::string head(kLongFirstLine + 1, '\0');
+  in.read(head.data(), static_cast<std::streamsize>(head.size()));
+  head.resize(static_cast<std::size_t>(in.gcount()));
+  return head.size() > kLongFirstLine && head.find('\r') == std::string::npos;
+}
+
 // Every line feed that does not follow a carriage return gets one.
 std::string WithCarriageReturns(std::string_view text) {
   std::string out;
@@ -124,10 +134,9 @@ int16_t ChooseOutputFile(Molvar& m) {
 }
 
 void FixLineEnds(Molvar& m) {
+  // Only a long first line asks for a look at the whole file.
+  if (!FirstLineIsLong(m.LastSourceFile)) return;
   const std::string text = ReadWholeFile(m.LastSourceFile);
-  const std::size_t firstLineEnd = text.find('\r');
-  const std::size_t firstLineLength = firstLineEnd == std::string::npos ? text.size() : firstLineEnd;
-  if (firstLineLength <= kLongFirstLine) return;
   // Only the line ends change; a long first line with proper line ends is left as it is.
   std::string fixed = WithCarriageReturns(text);
   if (fixed.size() == text.size()) return;
