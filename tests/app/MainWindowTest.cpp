@@ -7,6 +7,7 @@
 #include <variant>
 
 #include "app/Options.h"
+#include "support/Peers.h"
 #include "support/TestProgram.h"
 
 namespace molvar {
@@ -435,6 +436,18 @@ TEST(HelpMenu, HelpOnlineOrLocal) {
   EXPECT_EQ(shell[1].text, "file://" + folder + "/Help/MolvarHelp.html");
 }
 
+TEST(HelpMenu, LocalGuideIsShippedAndParses) {
+  const std::string guide = std::string(MOLVAR_RESOURCE_DIR) + "/Help/MolvarHelp.html";
+  ASSERT_TRUE(std::filesystem::exists(guide));
+  int rc = -1;
+  const std::string complaints = testing::RunCommand("xmllint --html --noout '" + guide + "' 2>&1", &rc);
+  EXPECT_EQ(rc, 0);
+  EXPECT_EQ(complaints, "");
+  const std::string text = ReadFile(guide);
+  EXPECT_NE(text.find("not yet available in this version"), std::string::npos);
+  EXPECT_NE(text.find("molvar-convert"), std::string::npos);
+}
+
 TEST(HelpMenu, UpdatesTutorialAndSeparator) {
   TestProgram t;
   mnuHelpItem_Click(*t, 2);
@@ -467,12 +480,17 @@ TEST(HelpMenu, AboutShowsBuildDateAndVersion) {
 TEST(Shutdown, WritesSettingsAndTrackData) {
   TestProgram t;
   t.AddPoint(-45.5, 170.25, "2026-12-01T10:00:00Z");
+  t.AddPoint(-45.6, 170.25, "2026-12-01T10:05:00Z");
+  t->OutputPath = t.folder.File("trip.kml");
   Form_Unload(*t);
   const std::string ini = ReadFile(t.folder.File("Molvar.ini"));
   EXPECT_NE(ini.find("NOCALL"), std::string::npos);
   const std::string data = ReadFile(t.folder.File("TrackData.txt"));
   EXPECT_NE(data.find("2026-12-01T10:00:00Z"), std::string::npos);
-  EXPECT_NE(data.find("-45.5"), std::string::npos);
+  EXPECT_EQ(data.substr(0, 2), "\r\n");  // no source file yet: an empty first line
+  EXPECT_NE(data.find(t->OutputPath + "\r\n"), std::string::npos);
+  EXPECT_NE(data.find("-45.5,170.25,"), std::string::npos);
+  EXPECT_NE(data.find("-45.6,170.25,"), std::string::npos);
 }
 
 TEST(Start, LoadsTheStoredModeAndVersion) {
@@ -490,7 +508,7 @@ TEST(Start, LoadsTheStoredModeAndVersion) {
   Form_Load(*again);
   EXPECT_EQ(again->VersionText, "17.0");
   EXPECT_EQ(again->ProgramMode, 2);
-  EXPECT_EQ(again->frmMain.window.Caption, " Molvar - Download Garmin Track ");
+  EXPECT_TRUE(again->frmMain.mnuModeItem(2).Checked);
   EXPECT_TRUE(again->frmMain.mnuUnitsItem(2).Checked);
   EXPECT_EQ(again->SpeedUnitLabel, " kts");
 }
