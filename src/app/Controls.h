@@ -27,6 +27,7 @@ struct OptionButton : Control {
 
 struct TextBox : Control {
   std::string Text;
+  int Left = 0, Top = 0, Width = 0, Height = 0;  // twips; 0 leaves the window's own layout
 };
 
 struct ComboBox : Control {

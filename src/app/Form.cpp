@@ -101,7 +101,7 @@ MainForm::MainForm() {
   SatelliteBar.ToolTipText = " Number of satellites received ";
   SatelliteBar.Max = 12;
 
-  Init(txtCallSign, "", " Ham radio callsign to search for ").Text = "CALLSIGN";
+  Init(txtCallSign, "", " Ham radio callsign to search for ").Text = "NOCALL";
   Init(chkPollInternet, "Poll Internet", " Get latest location every 10 to 30 sec. ");
   Init(optURL.Add(0), "Findu", " Select which URL to use ").Value = true;
   Init(optURL.Add(1), "Jfindu", " Select which URL to use ");

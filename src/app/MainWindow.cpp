@@ -1,5 +1,7 @@
 #include "app/MainWindow.h"
 
+#include <filesystem>
+
 #include "app/Molvar.h"
 #include "app/Options.h"
 #include "app/Settings.h"
@@ -47,10 +49,8 @@ void ResetModeControls(Molvar& m) {
 
 void EnterWaypointMode(Molvar& m) {
   MainForm& f = m.frmMain;
-  if (m.AltitudeMode == 3) {
-    m.AltitudeMode = 2;
-    f.comboAltitude.ListIndex = 2;
-  }
+  // Through the list's own handler, so the speed-gain slider follows the new mode.
+  if (m.AltitudeMode == 3) SelectAltitudeMode(m, 2);
   f.window.Caption = " Molvar - Convert Waypoints ";
   if (m.Waypoints.WptCount == 0) f.cmdRefresh.Enabled = false;
   for (Control* c : std::initializer_list<Control*>{&f.cmdSetColor, &f.chkUseThreshold, &f.txtSpeedThreshold,
@@ -92,6 +92,7 @@ void EnterAgwMode(Molvar& m) {
   BringToFront(f, f.AgwFrame);
   // The AGW station tracking starts here once the engine link exists.
   for (CheckBox* box : {&f.chkDetailed, &f.chkCollapse, &f.chkSplitIfStopped, &f.chkAuto}) box->Value = 0;
+  ApplyDetailed(m);
   ApplyCollapse(m);
   ApplySplitIfStopped(m);
   ApplyAutoOpen(m);
@@ -182,7 +183,11 @@ void mnuHelpItem_Click(Molvar& m, int index) {
       if (m.platform.InternetAvailable()) {
         m.platform.ShellOpen("open", kOnlineHelpPage, "", "");
       } else {
-        m.platform.ShellOpen("open", "file://" + m.ProgramPath("Help/MolvarHelp.html"), "", "");
+        // A file address needs an absolute path; the program folder may be given relative.
+        const std::string local = m.ProgramPath("Help/MolvarHelp.html");
+        std::error_code error;
+        const auto file = std::filesystem::absolute(local, error);
+        m.platform.ShellOpen("open", "file://" + (error ? local : file.string()), "", "");
       }
       return;
     case 2: m.platform.ShellOpen("open", kHomePage, "", ""); return;

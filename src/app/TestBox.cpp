@@ -16,6 +16,10 @@ void SwitchOn(Molvar& m) {
   m.TestMode = 1;
   f.window.Width = kTestWidth;
   f.window.Height = kTestHeight;
+  f.txtTest.Left = 120;
+  f.txtTest.Top = 6360;
+  f.txtTest.Width = 11000;
+  f.txtTest.Height = 5320;
   f.txtTest.Visible = true;
   f.lblTest.Caption =
       "You are in test mode. All input data is sent to the textbox below.\r\n"
