@@ -1,17 +1,33 @@
 #include "app/Resources.h"
 
+#include <algorithm>
 #include <filesystem>
+#include <fstream>
+#include <iterator>
 
 namespace molvar {
 namespace {
 
 namespace fs = std::filesystem;
 
-// Through a temporary name, so a copy cut short never stands as the file; the rename happens only
-// while the target is still missing.
-void CopyMissing(const fs::path& from, const fs::path& to) {
+// The help pages are the program's own and follow its version; every other file there may be the
+// user's (a custom icon) and is never replaced.
+bool IsProgramOwned(const fs::path& relative) { return !relative.empty() && *relative.begin() == "Help"; }
+
+bool SameContent(const fs::path& a, const fs::path& b) {
   std::error_code ec;
-  if (fs::exists(fs::symlink_status(to, ec))) return;
+  if (fs::file_size(a, ec) != fs::file_size(b, ec) || ec) return false;
+  std::ifstream x(a, std::ios::binary), y(b, std::ios::binary);
+  return std::equal(std::istreambuf_iterator<char>(x), std::istreambuf_iterator<char>(),
+                    std::istreambuf_iterator<char>(y));
+}
+
+// Through a temporary name, so a copy cut short never stands as the file; unless `replace`, the
+// rename happens only while the target is still missing.
+void Install(const fs::path& from, const fs::path& to, bool replace) {
+  std::error_code ec;
+  const bool exists = fs::exists(fs::symlink_status(to, ec));
+  if (exists && (!replace || SameContent(from, to))) return;
   fs::create_directories(to.parent_path(), ec);
   if (ec) return;
   fs::path part = to;
@@ -21,7 +37,7 @@ void CopyMissing(const fs::path& from, const fs::path& to) {
     fs::remove(part, ec);
     return;
   }
-  if (!fs::exists(fs::symlink_status(to, ec))) fs::rename(part, to, ec);
+  if (replace || !fs::exists(fs::symlink_status(to, ec))) fs::rename(part, to, ec);
   fs::remove(part, ec);
 }
 
@@ -36,7 +52,8 @@ void InstallResources(const std::string& programFolder, const std::string& resou
   for (auto it = fs::recursive_directory_iterator(source, fs::directory_options::skip_permission_denied, ec);
        !ec && it != fs::recursive_directory_iterator(); it.increment(ec)) {
     if (!it->is_regular_file(ec)) continue;
-    CopyMissing(it->path(), target / fs::relative(it->path(), source, ec));
+    const fs::path relative = fs::relative(it->path(), source, ec);
+    Install(it->path(), target / relative, IsProgramOwned(relative));
   }
 }
 

@@ -5,7 +5,8 @@
 namespace molvar {
 
 // Copies every file under `resourceDir` (keeping its sub-folders) into `programFolder` where that
-// file is missing. A file already there is the user's and is never replaced. Files that cannot be
+// file is missing. A file already there is the user's and is never replaced, except the help pages
+// under Help/, which are the program's own and are brought up to date. Files that cannot be
 // copied are left out; the writers refer to them by path and Google Earth shows a blank icon.
 void InstallResources(const std::string& programFolder, const std::string& resourceDir = MOLVAR_RESOURCE_DIR);
 

@@ -9,6 +9,7 @@
 #include <string_view>
 #include <vector>
 
+#include "app/MainWindow.h"
 #include "app/Molvar.h"
 #include "app/Options.h"
 #include "core/Numbers.h"
@@ -420,7 +421,9 @@ void OpenAgwpeFile(Molvar& m) {
   m.AgwpeFile.open(m.ProgramPath(kAgwpeFileName), std::ios::out | std::ios::trunc | std::ios::binary);
 }
 
-void ApplyLoadedSettings(Molvar& m) {
+// `selectMode` is the program-mode menu handler: the window's full one at start-up, only the
+// check mark for the converter, which shows no window.
+void ApplyLoadedSettings(Molvar& m, void (*selectMode)(Molvar&, int)) {
   auto& f = m.frmMain;
   f.window.Left = f.window.Left < 0 ? 0 : (f.window.Left > 8000 ? 8000 : f.window.Left);
   f.window.Top = f.window.Top < 0 ? 0 : (f.window.Top > 5000 ? 5000 : f.window.Top);
@@ -436,7 +439,7 @@ void ApplyLoadedSettings(Molvar& m) {
   SelectAltitudeMode(m, m.AltitudeMode);
   SelectTrackFileType(m, m.TrackFileType);
 
-  CheckProgramModeItem(m, m.ProgramMode);
+  selectMode(m, m.ProgramMode);
   SelectOutputMode(m, m.OutputMode);
   SelectComPort(m, m.ComPortNumber);
   SelectBaudRate(m, m.BaudRateIndex);
@@ -494,14 +497,14 @@ void LoadSettings(Molvar& m) {
   ApplySettingDefaults(m);
   ReadSettingsFile(m);
   OpenAgwpeFile(m);
-  ApplyLoadedSettings(m);
+  ApplyLoadedSettings(m, &mnuModeItem_Click);
   LoadTrackData(m);
 }
 
 void LoadOptionsOnly(Molvar& m) {
   ApplySettingDefaults(m);
   if (std::filesystem::exists(m.ProgramPath(kSettingsFileName))) ReadSettingsFile(m);
-  ApplyLoadedSettings(m);
+  ApplyLoadedSettings(m, &CheckProgramModeItem);
 }
 
 bool SaveSettings(Molvar& m) {

@@ -30,7 +30,7 @@ bool StartGoogleEarth(Molvar& m, const std::string& file) {
 bool AskGoogleEarthPath(Molvar& m) {
   FileDialogRequest request;
   request.title = "Locate Google Earth";
-  request.filter = "GE executable (*.exe)|*.exe";
+  request.filter = "GE executable (google-earth*)|google-earth*|All files (*)|*";
   request.initialFolder = std::string(m.GoogleEarthPath.substr(0, m.GoogleEarthPath.find_last_of('/') == std::string::npos ? 0 : m.GoogleEarthPath.find_last_of('/')));
   request.proposedName = m.GoogleEarthPath;
   const auto chosen = m.platform.OpenFileDialog(request);

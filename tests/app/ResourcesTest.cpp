@@ -43,6 +43,18 @@ TEST(Resources, MissingFilesAreCopiedWithTheirFoldersAndTheUsersFilesStay) {
   EXPECT_EQ(ReadFile(program.File("Icons/0.png")), "red dot");
 }
 
+TEST(Resources, HelpPagesFollowTheProgram) {
+  TempFolder resources;
+  fs::create_directories(resources.path() / "Help");
+  WriteFile(resources.File("Help/MolvarHelp.html"), "new guide");
+  TempFolder program;
+  fs::create_directories(program.path() / "Help");
+  WriteFile(program.File("Help/MolvarHelp.html"), "old guide");
+  InstallResources(program.path().string(), resources.path().string());
+  EXPECT_EQ(ReadFile(program.File("Help/MolvarHelp.html")), "new guide");
+  EXPECT_FALSE(fs::exists(program.File("Help/MolvarHelp.html.part")));
+}
+
 TEST(Resources, MissingSourceOrUnwritableTargetChangesNothing) {
   TempFolder program;
   InstallResources(program.path().string(), program.File("no-such-folder"));

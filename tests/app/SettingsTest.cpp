@@ -135,7 +135,9 @@ TEST(LoadSettings, EveryValueChangedIsRestoredAndWrittenBackUnchanged) {
   EXPECT_EQ(m.GmtMinutes, -330);
   EXPECT_EQ(f.chkCollapse.Value, 1);
   EXPECT_EQ(m.CollapseSegments, 1);
-  EXPECT_FALSE(f.chkUseSplit.Enabled);
+  // Collapsing cleared the split box; the mode replay that follows enables it again, as every
+  // mode change does.
+  EXPECT_EQ(f.chkUseSplit.Value, 0);
   EXPECT_EQ(f.chkFastest.Value, 0);
   EXPECT_EQ(f.chkAuto.Value, 0);
   EXPECT_EQ(m.AutoOpen, 0);
@@ -144,7 +146,7 @@ TEST(LoadSettings, EveryValueChangedIsRestoredAndWrittenBackUnchanged) {
   EXPECT_EQ(m.TransparencyLevel, 128);
   EXPECT_EQ(f.sldrFade.Value, 128);
   EXPECT_EQ(f.chkDetailed.Value, 0);
-  EXPECT_FALSE(f.chkUseThreshold.Enabled);
+  EXPECT_TRUE(f.txtSpeedThreshold.Text.empty());
   EXPECT_EQ(f.sldrGain.Value, 33);
   EXPECT_EQ(m.SpeedGain, 33);
   EXPECT_EQ(f.txtCallSign.Text, "VE3ABC");
@@ -641,6 +643,11 @@ TEST(LoadSettings, StoredWaypointModeRefusesSpeedAsAltitude) {
   EXPECT_EQ(t->ProgramMode, 1);
   EXPECT_EQ(t->AltitudeMode, 2);
   EXPECT_EQ(t->frmMain.comboAltitude.Text(), " Extrude track to ground");
+  // The mode menu handler ran: the window shows the waypoint mode.
+  EXPECT_EQ(t->frmMain.window.Caption, " Molvar - Convert Waypoints ");
+  EXPECT_TRUE(t->frmMain.WptFrame.InFront);
+  EXPECT_FALSE(t->frmMain.TrackFrame.InFront);
+  EXPECT_FALSE(t->frmMain.chkStartFinish.Enabled);
 }
 
 }  // namespace

@@ -213,7 +213,7 @@ TEST(OpenOutput, MissingGoogleEarthAsksUntilOneStartsOrCancel) {
             "GoogleEarth not found. Close this window. In the file dialog box that opens, find Google Earth and open "
             "it.\r\nThe location will be saved for the next time.");
   EXPECT_EQ(messages[0].title, " Whoops!...");
-  EXPECT_EQ(t.platform.CallsOf("OpenFileDialog").at(0).dialog.filter, "GE executable (*.exe)|*.exe");
+  EXPECT_EQ(t.platform.CallsOf("OpenFileDialog").at(0).dialog.filter, "GE executable (google-earth*)|google-earth*|All files (*)|*");
 
   TestProgram c;
   c->OutputPath = "/x/t.kml";
