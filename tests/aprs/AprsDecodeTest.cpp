@@ -257,6 +257,9 @@ TEST(DecodeMicE, AmbiguityAndHemisphereCharacters) {
       {"S32L6T:", 1, "3320.6400", "S"},  // "L" in the fourth place: South
       {"S3200T:", 1, "3320.0400", "S"},
       {"S32UZZ:", 1, "3325.0000", "N"},  // "Z": blank digits, offset and West
+      {"S32ZZZ:", 1, "3320.0000", "N"},  // a blank is the low end of its digit: 33 2x minutes
+      {"S32LLL:", 1, "3320.0000", "S"},
+      {"SZZZZZ:", 1, "3000.0000", "N"},
       {"S32M6T:", 0, "", ""},            // fourth character outside every group
       {"S32a6T:", 0, "", ""},
       {"S32-6T:", 0, "", ""},
