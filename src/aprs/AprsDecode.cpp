@@ -174,6 +174,7 @@ std::string DecodeMicE(Molvar& m, std::string_view packet) {
   for (std::size_t i = 0; i < 6; ++i) {
     const auto code = ReadDestinationChar(packet[i]);
     if (!code) return std::string(kMicEUndecodable);
+    // A blank (position ambiguity) reads as 0, the low end of the range it hides.
     digits[i] = code->digit < 0 ? 0 : code->digit;
     if (i < 3) {
       bits.push_back(code->bit);
