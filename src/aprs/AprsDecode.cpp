@@ -111,9 +111,11 @@ void StorePosition(Molvar& m, Position&& pos, bool micE) {
   NmeaFields& n = fix.Fields;
   if (micE) {
     n.SentenceName = "$GPRMC";
-    n.SpeedText = std::move(pos.speedText);
     n.CourseText = std::move(pos.courseText);
   }
+  // A plain report's speed is not decoded: its point must not inherit the speed of an earlier
+  // Mic-E report, possibly of another station.
+  n.SpeedText = micE ? std::move(pos.speedText) : std::string(1, '0');
   n.LatitudeText = std::move(pos.latitude);
   n.LatitudeHemisphere = std::move(pos.latitudeHemisphere);
   n.LongitudeText = std::move(pos.longitude);
@@ -128,7 +130,7 @@ void StorePosition(Molvar& m, Position&& pos, bool micE) {
   AddParsedPoint(m);
 }
 
-void NoPosition(NmeaFix& fix) {
+void NoMicEPosition(NmeaFix& fix) {
   fix.NmeaValid = 0;
   fix.NmeaLatitude = 0;
   fix.NmeaLongitude = 0;
@@ -137,8 +139,7 @@ void NoPosition(NmeaFix& fix) {
 }  // namespace
 
 void ParseAprsPosition(Molvar& m, std::string_view packet) {
-  NmeaFix& fix = m.Nmea;
-  NoPosition(fix);
+  m.Nmea.NmeaValid = 0;
   const long d = InStr(packet, ".");
   if (d < 5 || static_cast<long>(packet.size()) <= d + 12) return;
   const std::string_view s = Mid(packet, d - 4);
@@ -161,8 +162,7 @@ void ParseAprsPosition(Molvar& m, std::string_view packet) {
 }
 
 std::string DecodeMicE(Molvar& m, std::string_view packet) {
-  NmeaFix& fix = m.Nmea;
-  NoPosition(fix);
+  NoMicEPosition(m.Nmea);
   if (packet.size() < 12) return std::string(kMicEUndecodable);
 
   std::array<int, 6> digits{};
@@ -174,6 +174,7 @@ std::string DecodeMicE(Molvar& m, std::string_view packet) {
   for (std::size_t i = 0; i < 6; ++i) {
     const auto code = ReadDestinationChar(packet[i]);
     if (!code) return std::string(kMicEUndecodable);
+    // A blank (position ambiguity) reads as 0, the low end of the range it hides.
     digits[i] = code->digit < 0 ? 0 : code->digit;
     if (i < 3) {
       bits.push_back(code->bit);
@@ -187,8 +188,11 @@ std::string DecodeMicE(Molvar& m, std::string_view packet) {
   if (latitudeHemisphere == 0) return std::string(kMicEUndecodable);
   const int latDegrees = digits[0] * 10 + digits[1];
   const int latMinutes = digits[2] * 10 + digits[3];
-  if (latDegrees > 90 || latMinutes >= 60) return std::string(kMicEUndecodable);
-  const double latitude = latDegrees * 100 + latMinutes + (digits[4] * 10 + digits[5]) / 100.0;
+  const int latHundredths = digits[4] * 10 + digits[5];
+  if (latMinutes >= 60 || latDegrees * 6000 + latMinutes * 100 + latHundredths > 90 * 6000) {
+    return std::string(kMicEUndecodable);
+  }
+  const double latitude = latDegrees * 100 + latMinutes + latHundredths / 100.0;
 
   const long colon = InStr(packet, ":");
   const std::string_view info = colon == 0 ? std::string_view{} : Mid(packet, colon + 1);
