@@ -69,6 +69,10 @@ struct Waypoint {
   std::string WptName;
   std::string WptComment;
   std::string WptDescription;
+  // The text a placemark is labelled with: 0 name, 1 comment, 2 description.
+  std::string& Label(int16_t source) {
+    return source == 1 ? WptComment : source == 2 ? WptDescription : WptName;
+  }
 };
 
 class WaypointStore {

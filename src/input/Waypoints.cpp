@@ -77,9 +77,7 @@ void ReadOziWaypointLine(Molvar& m, std::string_view line) {
   w.WptAltitude = OziWaypointAltitude(m, f[15]);
   w.WptComment = ProperCase(Replace(Trim(f[11]), "&", " and ", 1));
   w.WptDescription.clear();
-  std::string& label = m.PlacemarkLabelSource == 1   ? w.WptComment
-                       : m.PlacemarkLabelSource == 2 ? w.WptDescription
-                                                     : w.WptName;
+  std::string& label = w.Label(m.PlacemarkLabelSource);
   WriteWaypointPlacemark(m, label, w.WptLongitude, w.WptLatitude, w.WptAltitude);
 }
 

@@ -81,19 +81,15 @@ void StoreTrackPoint(Molvar& m, MarkupReaderState& s) {
 
 void StoreWaypoint(Molvar& m, MarkupReaderState& s) {
   Waypoint& w = m.Waypoints.Add();
-  std::string* label = &s.name;
-  if (m.PlacemarkLabelSource == 1) label = &s.cmt;
-  if (m.PlacemarkLabelSource == 2) label = &s.desc;
-  *label = StripCdata(*label);
   w.WptLatitude = Val(s.lat);
   w.WptLongitude = Val(s.lon);
   w.WptAltitude = RoundToInt32Or(Val(s.ele), 0);
   w.WptName = s.name;
   w.WptComment = s.cmt;
   w.WptDescription = s.desc;
-  std::string& text = m.PlacemarkLabelSource == 1   ? w.WptComment
-                      : m.PlacemarkLabelSource == 2 ? w.WptDescription
-                                                    : w.WptName;
+  // Only the label text loses its CDATA wrapper.
+  std::string& text = w.Label(m.PlacemarkLabelSource);
+  text = StripCdata(text);
   WriteWaypointPlacemark(m, text, w.WptLongitude, w.WptLatitude, w.WptAltitude);
 }
 

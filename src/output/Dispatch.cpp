@@ -141,9 +141,7 @@ void RefreshOutput(Molvar& m) {
   for (int32_t i = 1; i <= waypoints.WptCount; ++i) {
     Waypoint& w = waypoints.at(i);
     w.WptAltitude = altitude;
-    const std::string& label = m.PlacemarkLabelSource == 1   ? w.WptComment
-                               : m.PlacemarkLabelSource == 2 ? w.WptDescription
-                                                             : w.WptName;
+    const std::string& label = w.Label(m.PlacemarkLabelSource);
     WriteKmlPlacemark(m, label, w.WptLongitude, w.WptLatitude, w.WptAltitude, "FFFFFF", kPlacemarkGeneral);
   }
   WriteKmlFooter(m);
