@@ -133,12 +133,7 @@ void WriteDetailedData(Molvar& m) {
       InsertAltitudeMode(m, p.Altitude);
       std::string& line = out.Text();
       line.append("    <coordinates>");
-      AppendDouble(line, p.Longitude);
-      line.push_back(',');
-      AppendDouble(line, p.Latitude);
-      line.push_back(',');
-      if (m.AltitudeMode == 3) AppendDouble(line, m.SpeedGain * p.Speed);
-      else AppendInt(line, p.Altitude);
+      AppendKmlCoordinate(m, p, line);
       line.append("</coordinates>");
       out.EndLine();
       out.Line("  </Point>");

@@ -105,6 +105,18 @@ void WriteKmlStyle(Molvar& m, int16_t selector) {
   out.Line("  </Style>");
 }
 
+void AppendKmlCoordinate(const Molvar& m, const TrackPoint& p, std::string& line) {
+  AppendDouble(line, p.Longitude);
+  line.push_back(',');
+  AppendDouble(line, p.Latitude);
+  line.push_back(',');
+  if (m.AltitudeMode == 3) {
+    AppendDouble(line, m.SpeedGain * p.Speed);
+  } else {
+    AppendInt(line, p.Altitude);
+  }
+}
+
 void WriteKmlTrackSegment(Molvar& m, int32_t startIndex, int32_t count) {
   try {
     OutputFile& out = m.Out;
@@ -123,12 +135,7 @@ void WriteKmlTrackSegment(Molvar& m, int32_t startIndex, int32_t count) {
       const TrackPoint& p = track[static_cast<int32_t>(j64)];
       std::string& line = out.Text();
       line.append("    ");
-      AppendDouble(line, p.Longitude);
-      line.push_back(',');
-      AppendDouble(line, p.Latitude);
-      line.push_back(',');
-      if (m.AltitudeMode == 3) AppendDouble(line, m.SpeedGain * p.Speed);
-      else AppendInt(line, p.Altitude);
+      AppendKmlCoordinate(m, p, line);
       line.push_back(' ');
       out.EndLine();
     }

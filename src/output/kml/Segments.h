@@ -7,6 +7,7 @@
 namespace molvar {
 
 struct Molvar;
+struct TrackPoint;
 
 // Walks points 1..PointCount keeping SegmentCount, DayCount and CurrentPoint, and calls `segment`
 // with the start index and count of every segment (by day when segments are collapsed). The KML
@@ -15,6 +16,8 @@ void ForEachSegment(Molvar& m, const std::function<void(int32_t start, int32_t c
 // The KML body: one WriteKmlTrackSegment per segment.
 void WriteKmlSegments(Molvar& m);
 
+// "lon,lat,alt" of a point; with speed as altitude the height is the gained speed.
+void AppendKmlCoordinate(const Molvar& m, const TrackPoint& p, std::string& line);
 // One Placemark with points start..start+count (stopping at the last point).
 void WriteKmlTrackSegment(Molvar& m, int32_t startIndex, int32_t count);
 std::string SegmentTitle(Molvar& m, int32_t startIndex);
