@@ -9,12 +9,8 @@
 namespace molvar {
 namespace {
 
+using testing::Bytes;
 using testing::TestProgram;
-
-template <std::size_t N>
-std::string Bytes(const char (&s)[N]) {
-  return std::string(s, N - 1);
-}
 
 struct AprsFile : TestProgram {
   AprsFile() {

@@ -10,13 +10,8 @@
 namespace molvar {
 namespace {
 
+using testing::Bytes;
 using testing::TestProgram;
-
-// Text with NUL and other bytes, without the literal's closing NUL.
-template <std::size_t N>
-std::string Bytes(const char (&s)[N]) {
-  return std::string(s, N - 1);
-}
 
 constexpr const char* kOutOfSequenceTitle = " Bad timestamp in input file";
 

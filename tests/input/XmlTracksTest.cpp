@@ -15,12 +15,8 @@
 namespace molvar {
 namespace {
 
+using testing::Bytes;
 using testing::TestProgram;
-
-template <std::size_t N>
-std::string Bytes(const char (&s)[N]) {
-  return std::string(s, N - 1);
-}
 
 // Three points a minute apart, written by gpsbabel in the tests below.
 constexpr const char* kPeerCsv =

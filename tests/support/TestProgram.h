@@ -35,6 +35,12 @@ struct TestProgram {
   void AddPoint(double lat, double lon, std::string_view time, double speed = 0);
 };
 
+// Text with NUL and other bytes, without the literal's closing NUL.
+template <std::size_t N>
+std::string Bytes(const char (&s)[N]) {
+  return std::string(s, N - 1);
+}
+
 std::string ReadFile(const std::string& path);
 void WriteFile(const std::string& path, std::string_view content);
 
