@@ -267,9 +267,51 @@ bool IsValidCivil(const CivilTime& c) {
 
 bool InDateRange(TimeSeconds t) { return t >= kMinTime && t <= kMaxTime; }
 
+namespace {
+
+// The number of the two digits at `at`, or -1.
+int TwoDigitsAt(std::string_view s, std::size_t at) {
+  if (!IsDigit(s[at]) || !IsDigit(s[at + 1])) return -1;
+  return (s[at] - '0') * 10 + (s[at + 1] - '0');
+}
+
+// "yyyy-mm-dd?hh:nn:ss" at the start of `s` (any character at "?"), the layout of every stored
+// timestamp and of GPX times; false for anything else, which the general parser then reads.
+bool ReadFixedLayout(std::string_view s, CivilTime& c) {
+  if (s.size() < 19 || s[4] != '-' || s[7] != '-' || s[13] != ':' || s[16] != ':') return false;
+  const int century = TwoDigitsAt(s, 0), year = TwoDigitsAt(s, 2), month = TwoDigitsAt(s, 5),
+            day = TwoDigitsAt(s, 8), hour = TwoDigitsAt(s, 11), minute = TwoDigitsAt(s, 14),
+            second = TwoDigitsAt(s, 17);
+  if (century < 0 || year < 0 || month < 0 || day < 0 || hour < 0 || minute < 0 || second < 0) return false;
+  c = CivilTime{century * 100 + year, month, day, hour, minute, second};
+  return true;
+}
+
+// The stored forms "yyyy-mm-dd hh:nn:ss" and "yyyy-mm-dd hh:nn:ss AM/PM" without the general
+// scanner; nullopt when `text` has another layout.
+std::optional<std::optional<TimeSeconds>> ParseStoredForm(std::string_view text) {
+  CivilTime c;
+  if ((text.size() != 19 && text.size() != 22) || text[10] != ' ' || !ReadFixedLayout(text, c)) return std::nullopt;
+  if (text.size() == 22) {
+    const std::string_view designator = text.substr(20);
+    const bool pm = designator == kPmDesignator;
+    if (text[19] != ' ' || (!pm && designator != kAmDesignator)) return std::nullopt;
+    if (c.hour > 12) return std::optional<TimeSeconds>{};
+    if (c.hour == 12) c.hour = 0;
+    if (pm) c.hour += 12;
+  }
+  if (!IsValidCivil(c)) return std::optional<TimeSeconds>{};
+  const TimeSeconds t = ToSeconds(c);
+  if (!InDateRange(t)) return std::optional<TimeSeconds>{};
+  return std::optional<TimeSeconds>{t};
+}
+
+}  // namespace
+
 std::optional<TimeSeconds> ParseDateTime(std::string_view text) {
   text = Trim(text);
   if (text.empty()) return std::nullopt;
+  if (const auto stored = ParseStoredForm(text)) return *stored;
   Scanner sc{text};
   CivilTime c;
   bool hasDate = false;
@@ -301,26 +343,35 @@ TimeSeconds ParseDateTimeOrThrow(std::string_view text) {
   return *t;
 }
 
-void AppendTimestamp(std::string& out, TimeSeconds t) {
+TimestampText MakeTimestamp(TimeSeconds t) {
   const CivilTime c = ToCivil(t);
-  AppendDate(out, c);
-  out.push_back(' ');
-  const int hour12 = c.hour % 12 == 0 ? 12 : c.hour % 12;
-  AppendTwo(out, hour12);
-  out.push_back(':');
-  AppendTwo(out, c.minute);
-  out.push_back(':');
-  AppendTwo(out, c.second);
-  out.push_back(' ');
-  out.append(c.hour < 12 ? kAmDesignator : kPmDesignator);
+  TimestampText text;
+  char* p = text.chars.data();
+  const auto two = [&p](int v) {
+    *p++ = static_cast<char>('0' + v / 10);
+    *p++ = static_cast<char>('0' + v % 10);
+  };
+  two(c.year / 100);
+  two(c.year % 100);
+  *p++ = '-';
+  two(c.month);
+  *p++ = '-';
+  two(c.day);
+  *p++ = ' ';
+  two(c.hour % 12 == 0 ? 12 : c.hour % 12);
+  *p++ = ':';
+  two(c.minute);
+  *p++ = ':';
+  two(c.second);
+  *p++ = ' ';
+  const std::string_view designator = c.hour < 12 ? kAmDesignator : kPmDesignator;
+  std::memcpy(p, designator.data(), designator.size());
+  return text;
 }
 
-std::string FormatTimestamp(TimeSeconds t) {
-  std::string out;
-  out.reserve(22);
-  AppendTimestamp(out, t);
-  return out;
-}
+void AppendTimestamp(std::string& out, TimeSeconds t) { out.append(MakeTimestamp(t).view()); }
+
+std::string FormatTimestamp(TimeSeconds t) { return std::string(MakeTimestamp(t).view()); }
 
 void AppendIsoUtc(std::string& out, TimeSeconds t) {
   const CivilTime c = ToCivil(t);
@@ -367,7 +418,7 @@ std::optional<OziDate> TextToOziDate(std::string_view text, int gmtMinutes) {
   const TimeSeconds gmt = *t - static_cast<TimeSeconds>(gmtMinutes) * 60;
   if (!InDateRange(gmt)) return std::nullopt;
   OziDate d;
-  d.gmtForm = FormatTimestamp(gmt);
+  d.gmtForm = MakeTimestamp(gmt);
   static const TimeSeconds k1900 = ToSeconds(CivilTime{1900, 1, 1, 0, 0, 0});
   const double s = static_cast<double>(gmt - k1900);
   d.dayNumber = RoundAtDecimals(s / kSecondsPerDay + 2, 6);
@@ -401,19 +452,35 @@ std::string GarminRecordTime(std::string_view record, int gmtMinutes) {
   return FormatTimestamp(t);
 }
 
-std::string IsoTimeToTimestamp(std::string_view elementText, int gmtMinutes) {
+CompactString IsoTimeToTimestamp(std::string_view elementText, int gmtMinutes) {
+  // The usual "yyyy-mm-ddThh:nn:ss[.fff]Z" is read in place; it means what the general path
+  // below makes of it.
+  CivilTime c;
+  if (ReadFixedLayout(elementText, c) && (elementText[10] == 'T' || elementText[10] == 't')) {
+    std::size_t z = 19;
+    if (z < elementText.size() && elementText[z] == '.') {
+      ++z;
+      while (z < elementText.size() && IsDigit(elementText[z])) ++z;
+    }
+    if (z < elementText.size() && elementText[z] == 'Z') {
+      if (!IsValidCivil(c)) return {};
+      const TimeSeconds t = ToSeconds(c) + static_cast<TimeSeconds>(gmtMinutes) * 60;
+      if (!InDateRange(ToSeconds(c)) || !InDateRange(t)) return {};
+      return CompactString(MakeTimestamp(t).view());
+    }
+  }
   const long t = InStrNoCase(elementText, "T");
-  if (t == 0) return ShiftedTimestamp(elementText, gmtMinutes);
+  if (t == 0) return CompactString(ShiftedTimestamp(elementText, gmtMinutes));
   const std::string_view date = Left(elementText, t - 1);
   const std::string_view rest = Mid(elementText, t + 1);
   const auto z = rest.find('Z');
-  if (z == std::string_view::npos) return ShiftedTimestamp(elementText, gmtMinutes);
+  if (z == std::string_view::npos) return CompactString(ShiftedTimestamp(elementText, gmtMinutes));
   std::string joined;
   joined.reserve(date.size() + 1 + z);
   joined.append(date);
   joined.push_back(' ');
   joined.append(rest.substr(0, z));
-  return ShiftedTimestamp(joined, gmtMinutes);
+  return CompactString(ShiftedTimestamp(joined, gmtMinutes));
 }
 
 std::string NmeaTimeToTimestamp(std::string_view time, std::string_view date, int gmtMinutes) {

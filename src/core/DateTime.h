@@ -1,10 +1,13 @@
 #pragma once
 // Dates and times. A point in time is held as whole seconds from 30 December 1899 00:00:00 (the
 // epoch of Ozi day numbers); the stored text form is "yyyy-mm-dd hh:nn:ss AM/PM".
+#include <array>
 #include <cstdint>
 #include <optional>
 #include <string>
 #include <string_view>
+
+#include "core/CompactString.h"
 
 namespace molvar {
 
@@ -33,7 +36,12 @@ std::optional<TimeSeconds> ParseDateTime(std::string_view text);
 // The same, raising "Type mismatch" (13) for text that is not a date.
 TimeSeconds ParseDateTimeOrThrow(std::string_view text);
 
-// "yyyy-mm-dd hh:nn:ss AM/PM".
+// "yyyy-mm-dd hh:nn:ss AM/PM", in a buffer of its own (the years are always four digits).
+struct TimestampText {
+  std::array<char, 22> chars{};
+  std::string_view view() const { return {chars.data(), chars.size()}; }
+};
+TimestampText MakeTimestamp(TimeSeconds t);
 std::string FormatTimestamp(TimeSeconds t);
 void AppendTimestamp(std::string& out, TimeSeconds t);
 // "yyyy-mm-dd" and "Thh:nn:ssZ" joined: the GPX time form.
@@ -55,7 +63,7 @@ std::string OziDateToText(std::string_view field, int gmtMinutes);
 // fields; nothing when the text is not a date.
 struct OziDate {
   double dayNumber = 0;
-  std::string gmtForm;
+  TimestampText gmtForm;
 };
 std::optional<OziDate> TextToOziDate(std::string_view text, int gmtMinutes);
 
@@ -69,7 +77,7 @@ float ReadBytesAsSingle(std::string_view bytes, long start);
 std::string GarminRecordTime(std::string_view record, int gmtMinutes);
 
 // The text of a GPX/XML <time> element as a local timestamp; empty when unreadable.
-std::string IsoTimeToTimestamp(std::string_view elementText, int gmtMinutes);
+CompactString IsoTimeToTimestamp(std::string_view elementText, int gmtMinutes);
 
 // NMEA time (hhmmss) and date (ddmmyy) fields as a local timestamp; empty fields count as
 // "000000" and "010106"; empty result when unreadable.

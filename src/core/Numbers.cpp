@@ -169,7 +169,45 @@ Decimal15 ToDecimal15(double v) {
 
 }  // namespace
 
+namespace {
+
+constexpr std::array<double, 16> kPowersOfTen = {1e0, 1e1, 1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
+                                                 1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
+
+// |v| × 10^decimals rounded as the digit route below rounds it (15 significant digits, then half
+// up), for the common case where that is plain arithmetic: at least one and at most 13 digits
+// kept (so the 15-digit step moves the value by under 0.005 of the last kept unit), and the
+// scaled value not within 0.01 of a half, where the two roundings could disagree. The digit
+// route handles everything else.
+bool RoundScaledFast(double v, int decimals, uint64_t& scaled) {
+  if (!std::isfinite(v) || decimals < 0 || decimals >= static_cast<int>(kPowersOfTen.size())) return false;
+  const double x = std::fabs(v) * kPowersOfTen[static_cast<std::size_t>(decimals)];
+  if (x < 1 || x >= 1e13) return false;
+  const double whole = std::floor(x);
+  const double fraction = x - whole;
+  if (std::fabs(fraction - 0.5) <= 0.01) return false;
+  scaled = static_cast<uint64_t>(fraction < 0.5 ? whole : whole + 1);
+  return true;
+}
+
+}  // namespace
+
 void AppendPattern(std::string& out, double v, int minIntegerDigits, int decimals) {
+  if (uint64_t scaled = 0; RoundScaledFast(v, decimals, scaled)) {
+    std::array<char, 24> text{};
+    const auto end = std::to_chars(text.data(), text.data() + text.size(), scaled).ptr;
+    const int length = static_cast<int>(end - text.data());
+    const int integerDigits = length > decimals ? length - decimals : 0;
+    if (std::signbit(v)) out.push_back('-');
+    for (int k = integerDigits; k < minIntegerDigits; ++k) out.push_back('0');
+    out.append(text.data(), static_cast<std::size_t>(integerDigits));
+    if (decimals > 0) {
+      out.push_back('.');
+      for (int k = length - integerDigits; k < decimals; ++k) out.push_back('0');
+      out.append(text.data() + integerDigits, static_cast<std::size_t>(length - integerDigits));
+    }
+    return;
+  }
   if (!std::isfinite(v)) v = 0;
   // Digits of the rounded magnitude, most significant first, with `decimals` digits after the
   // implied point: value = digits × 10^-decimals.
@@ -230,6 +268,12 @@ std::string FormatPattern(double v, std::string_view pattern) {
 }
 
 double RoundAtDecimals(double v, int decimals) {
+  // N / 10^d is the correctly rounded double of the decimal N × 10^-d, which is what reading the
+  // formatted text gives.
+  if (uint64_t scaled = 0; RoundScaledFast(v, decimals, scaled)) {
+    const double r = static_cast<double>(scaled) / kPowersOfTen[static_cast<std::size_t>(decimals)];
+    return std::signbit(v) ? -r : r;
+  }
   std::string text;
   AppendPattern(text, v, 1, decimals);
   double out = 0;

@@ -1,6 +1,7 @@
 #include "core/Text.h"
 
 #include <algorithm>
+#include <cstring>
 
 namespace molvar {
 
@@ -40,8 +41,6 @@ long InStr(long start, std::string_view s, std::string_view find) {
   return p == std::string_view::npos ? 0 : static_cast<long>(p) + 1;
 }
 
-char UpperChar(char c) { return (c >= 'a' && c <= 'z') ? static_cast<char>(c - 32) : c; }
-char LowerChar(char c) { return (c >= 'A' && c <= 'Z') ? static_cast<char>(c + 32) : c; }
 
 long InStrNoCase(std::string_view s, std::string_view find) { return InStrNoCase(1, s, find); }
 
@@ -50,13 +49,32 @@ long InStrNoCase(long start, std::string_view s, std::string_view find) {
   const auto from = static_cast<std::size_t>(start - 1);
   if (from > s.size()) return 0;
   if (find.empty()) return start;
-  if (find.size() > s.size()) return 0;
-  const char first = LowerChar(find[0]);
-  for (std::size_t i = from; i + find.size() <= s.size(); ++i) {
-    if (LowerChar(s[i]) != first) continue;
-    std::size_t k = 1;
-    while (k < find.size() && LowerChar(s[i + k]) == LowerChar(find[k])) ++k;
-    if (k == find.size()) return static_cast<long>(i) + 1;
+  if (find.size() > s.size() - from) return 0;
+  // A character without case (the "<" of a tag, the "=" of an attribute) is found with memchr;
+  // every occurrence of `find` holds it at the same offset, so they come in order.
+  std::size_t anchor = 0;
+  while (anchor < find.size() && LowerChar(find[anchor]) != UpperChar(find[anchor])) ++anchor;
+  const auto matchesAt = [&](std::size_t i) {
+    for (std::size_t k = 0; k < find.size(); ++k) {
+      if (LowerChar(s[i + k]) != LowerChar(find[k])) return false;
+    }
+    return true;
+  };
+  const std::size_t last = s.size() - find.size();  // the last place a match can start
+  if (anchor == find.size()) {
+    for (std::size_t i = from; i <= last; ++i) {
+      if (matchesAt(i)) return static_cast<long>(i) + 1;
+    }
+    return 0;
+  }
+  const char mark = find[anchor];
+  std::size_t scan = from + anchor;
+  while (scan <= last + anchor) {
+    const auto* hit = static_cast<const char*>(std::memchr(s.data() + scan, mark, last + anchor + 1 - scan));
+    if (!hit) return 0;
+    const auto i = static_cast<std::size_t>(hit - s.data()) - anchor;
+    if (matchesAt(i)) return static_cast<long>(i) + 1;
+    scan = i + anchor + 1;
   }
   return 0;
 }

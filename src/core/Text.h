@@ -35,8 +35,8 @@ std::string_view RTrim(std::string_view s);
 
 std::string UCase(std::string_view s);
 std::string LCase(std::string_view s);
-char UpperChar(char c);
-char LowerChar(char c);
+inline char UpperChar(char c) { return (c >= 'a' && c <= 'z') ? static_cast<char>(c - 32) : c; }
+inline char LowerChar(char c) { return (c >= 'A' && c <= 'Z') ? static_cast<char>(c + 32) : c; }
 bool EqualsNoCase(std::string_view a, std::string_view b);
 
 // Replaces at most `count` occurrences (all when count < 0).

@@ -7,8 +7,19 @@
 
 namespace molvar {
 namespace {
+
 constexpr std::size_t kChunk = 1 << 20;
+
+// The first CR or LF of [start, start + n), or nullptr. The LF is found first so that a file
+// without CR is never scanned to the end of the buffer for every line.
+const char* FindLineEnd(const char* start, std::size_t n) {
+  const auto* lf = static_cast<const char*>(std::memchr(start, '\n', n));
+  const std::size_t before = lf ? static_cast<std::size_t>(lf - start) : n;
+  const auto* cr = static_cast<const char*>(std::memchr(start, '\r', before));
+  return cr ? cr : lf;
 }
+
+}  // namespace
 
 LineReader::LineReader(const std::string& path) : file_(std::fopen(path.c_str(), "rb")) {
   if (!file_) {
@@ -16,26 +27,25 @@ LineReader::LineReader(const std::string& path) : file_(std::fopen(path.c_str(),
     const int number = err == ENOENT ? kErrFileNotFound : kErrPathFileAccess;
     throw RuntimeError(number, RuntimeError::StandardDescription(number) + " (" + path + ": " + std::strerror(err) + ")");
   }
+  buffer_.resize(kChunk);
 }
 
 bool LineReader::Fill() {
+  pos_ = size_ = 0;
   if (eof_) return false;
-  buffer_.erase(0, pos_);
-  pos_ = 0;
-  const std::size_t old = buffer_.size();
-  buffer_.resize(old + kChunk);
-  const std::size_t got = std::fread(buffer_.data() + old, 1, kChunk, file_.get());
-  buffer_.resize(old + got);
-  if (got < kChunk) eof_ = true;
-  return got > 0;
+  size_ = std::fread(buffer_.data(), 1, kChunk, file_.get());
+  if (size_ < kChunk) eof_ = true;
+  return size_ > 0;
 }
 
-bool LineReader::Next(std::string& line) {
-  line.clear();
+bool LineReader::Next(std::string_view& line) {
+  carry_.clear();
   bool any = false;
-  bool truncated = false;
   for (;;) {
-    if (pos_ >= buffer_.size() && !Fill()) return any;
+    if (pos_ >= size_ && !Fill()) {
+      line = carry_;
+      return any;
+    }
     if (skipLineFeed_) {
       skipLineFeed_ = false;
       if (buffer_[pos_] == '\n') {
@@ -44,26 +54,34 @@ bool LineReader::Next(std::string& line) {
       }
     }
     const char* start = buffer_.data() + pos_;
-    const std::size_t available = buffer_.size() - pos_;
-    const void* cr = std::memchr(start, '\r', available);
-    const void* lf = std::memchr(start, '\n', available);
-    const char* end = nullptr;
-    if (cr && lf) end = static_cast<const char*>(cr < lf ? cr : lf);
-    else end = static_cast<const char*>(cr ? cr : lf);
+    const std::size_t available = size_ - pos_;
+    const char* end = FindLineEnd(start, available);
     const std::size_t length = end ? static_cast<std::size_t>(end - start) : available;
-    if (!truncated) {
-      const std::size_t room = kMaxLineLength - line.size();
-      line.append(start, length < room ? length : room);
-      truncated = line.size() >= kMaxLineLength;
-    }
     any = true;
     if (end) {
       pos_ += length + 1;
       skipLineFeed_ = *end == '\r';
+      if (carry_.empty()) {
+        line = std::string_view(start, length < kMaxLineLength ? length : kMaxLineLength);
+        return true;
+      }
+    } else {
+      pos_ += length;
+    }
+    const std::size_t room = kMaxLineLength - carry_.size();
+    carry_.append(start, length < room ? length : room);
+    if (end) {
+      line = carry_;
       return true;
     }
-    pos_ += length;
   }
+}
+
+bool LineReader::Next(std::string& line) {
+  std::string_view view;
+  const bool got = Next(view);
+  line.assign(view);
+  return got;
 }
 
 }  // namespace molvar

@@ -5,6 +5,8 @@
 #include <cstdio>
 #include <memory>
 #include <string>
+#include <string_view>
+#include <vector>
 
 namespace molvar {
 
@@ -15,7 +17,9 @@ class LineReader {
   // Raises RuntimeError "File not found" (53) or "Path/File access error" (75) naming the path.
   explicit LineReader(const std::string& path);
 
-  // The next line without its line end; false at the end of the file.
+  // The next line without its line end; false at the end of the file. The view stays valid until
+  // the next call: most lines are handed out straight from the buffer, without a copy.
+  bool Next(std::string_view& line);
   bool Next(std::string& line);
 
  private:
@@ -25,8 +29,10 @@ class LineReader {
     void operator()(std::FILE* f) const { std::fclose(f); }
   };
   std::unique_ptr<std::FILE, Closer> file_;
-  std::string buffer_;
+  std::vector<char> buffer_;
   std::size_t pos_ = 0;
+  std::size_t size_ = 0;
+  std::string carry_;  // a line that runs across the end of the buffer
   bool eof_ = false;
   bool skipLineFeed_ = false;  // the last line ended with CR: a following LF belongs to it
 };

@@ -10,10 +10,11 @@ namespace molvar {
 inline TrackPoint& AppendTrackPoint(Molvar& m) {
   TrackStore& track = m.Track;
   track.PointCount += 1;
+  const bool fresh = track.PointCount > track.Bound();  // growing starts new elements empty
   track.GrowTrackStore(track.PointCount);
-  TrackPoint& p = track.at(track.PointCount);
+  TrackPoint& p = track[track.PointCount];
   // A new read restarts at point 1, which still holds the last read's values.
-  p = TrackPoint{};
+  if (!fresh) p = TrackPoint{};
   p.Flag = track.PointCount == 1 ? 1 : 0;
   return p;
 }

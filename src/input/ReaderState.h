@@ -1,6 +1,7 @@
 #pragma once
 // What the line readers keep between the lines of one file.
 #include <cstdint>
+#include <initializer_list>
 #include <string>
 
 namespace molvar {
@@ -21,7 +22,11 @@ struct MarkupReaderState {
   bool EndPoint = false;
   bool NewSegment = false;
   std::string lat, lon, ele, time, name, cmt, desc;
-  void Reset() { *this = MarkupReaderState{}; }
+  // Keeps the strings' storage: a point's texts need no allocation once the first is read.
+  void Reset() {
+    InPoint = EndPoint = NewSegment = false;
+    for (std::string* text : {&lat, &lon, &ele, &time, &name, &cmt, &desc}) text->clear();
+  }
 };
 
 struct NmeaParserState {

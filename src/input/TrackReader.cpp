@@ -51,12 +51,15 @@ void SkipHeader(Molvar& m, LineReader& in, int16_t type) {
   }
 }
 
-void ReadLine(Molvar& m, int16_t type, std::string& line) {
+void ReadLine(Molvar& m, int16_t type, std::string_view line, std::string& sentence) {
   switch (type) {
     case kTypeOzi: ReadOziTrackLine(m, line); break;
     case kTypeGpx: ReadGpxLine(m, line); break;
     case kTypeXml: ReadXmlLine(m, line); break;
-    case kTypeNmea: ParseNMEA(m, line); break;
+    case kTypeNmea:
+      sentence.assign(line);  // the parser edits its sentence
+      ParseNMEA(m, sentence);
+      break;
     case kTypeCsv1: ReadOrionCsvLine(m, line); break;
     case kTypeCsv2: ReadCsv2Line(m, line); break;
     case kTypeKml: ReadKmlCoordinateLine(m, UCase(line)); break;
@@ -78,11 +81,12 @@ void ReadLines(Molvar& m, LineReader& in, int16_t type) {
   TrackStore& track = m.Track;
   track.PointCount = 0;
   ResetReaders(m);
-  std::string line;
+  std::string_view line;
+  std::string sentence;
   while (in.Next(line)) {
     if (m.TestMode == 1 && track.PointCount < kTestBoxPointLimit) AppendToTestBox(m, line);
     const int32_t before = track.PointCount;
-    ReadLine(m, type, line);
+    ReadLine(m, type, line, sentence);
     if (m.ColorVaryMode == 3 && track.PointCount > before && DriverAssignsSpeedBand(type))
       AssignSpeedBand(m, track.PointCount);
   }

@@ -14,9 +14,16 @@ namespace molvar {
 namespace {
 
 struct ValueTag {
-  std::string_view open;   // searched in the lower-cased line
+  std::string_view open;   // found in any letter case
   std::string_view close;  // closing mark of the value; empty for an attribute
 };
+
+enum MarkupTag { kSegmentTag, kStartTag, kEndTag, kLatTag, kLonTag, kEleTag, kNameTag, kCmtTag,
+                 kDescTag, kTimeTag, kMarkupTagCount };
+// The lower-case opening marks looked for on each line, by MarkupTag; empty ones are not wanted.
+using TagMarks = std::array<std::string_view, kMarkupTagCount>;
+// Where each tag of one line first opens (0-based; npos when absent).
+using TagPlaces = std::array<std::size_t, kMarkupTagCount>;
 
 struct MarkupVocabulary {
   const char* procedure;
@@ -26,6 +33,13 @@ struct MarkupVocabulary {
   std::string_view waypointStart;
   std::string_view waypointEnd;
   ValueTag lat, lon, ele, name, cmt, desc, time;
+
+  // Waypoint files have no segments.
+  constexpr TagMarks Marks(bool waypoints) const {
+    return {waypoints ? std::string_view{} : segment, waypoints ? waypointStart : trackStart,
+            waypoints ? waypointEnd : trackEnd, lat.open, lon.open, ele.open, name.open, cmt.open,
+            desc.open, time.open};
+  }
 };
 
 constexpr MarkupVocabulary kGpx{
@@ -39,13 +53,53 @@ constexpr MarkupVocabulary kXml{
     {"<altitude>", "</altitude>"}, {"<name>", "</name>"}, {"<comment>", "</comment>"},
     {"<description>", "</description>"}, {"<time>", "</time>"}};
 
-// The value of `tag` on the line, cut before its closing mark (the rest of the line when the
-// mark is not on it); false when the tag is absent.
-bool TagValue(std::string_view line, std::string_view lower, const ValueTag& tag,
-              std::string& value) {
-  const long p = InStr(lower, tag.open);
-  if (p == 0) return false;
-  const long start = p + static_cast<long>(tag.open.size());
+// The marks of each vocabulary for tracks [0] and waypoints [1].
+constexpr std::array<TagMarks, 2> kGpxMarks = {kGpx.Marks(false), kGpx.Marks(true)};
+constexpr std::array<TagMarks, 2> kXmlMarks = {kXml.Marks(false), kXml.Marks(true)};
+
+
+// The tags that open with "<" are all found in one pass over the line's "<" characters; the
+// others (the GPX attributes) are searched on their own.
+bool OpensAt(std::string_view line, std::size_t at, std::string_view mark) {
+  if (mark.size() > line.size() - at) return false;
+  for (std::size_t k = 1; k < mark.size(); ++k) {
+    if (LowerChar(line[at + k]) != mark[k]) return false;
+  }
+  return true;
+}
+
+TagPlaces FindTags(std::string_view line, const TagMarks& marks) {
+  TagPlaces place;
+  place.fill(std::string_view::npos);
+  std::size_t pending = 0;  // tags opening with "<" not found yet
+  for (std::size_t t = 0; t < kMarkupTagCount; ++t) {
+    if (marks[t].empty()) continue;
+    if (marks[t].front() == '<') {
+      ++pending;
+    } else {
+      const long p = InStrNoCase(line, marks[t]);
+      if (p != 0) place[t] = static_cast<std::size_t>(p - 1);
+    }
+  }
+  for (std::size_t at = line.find('<'); pending > 0 && at != std::string_view::npos && at + 1 < line.size(); at = line.find('<', at + 1)) {
+    const char next = LowerChar(line[at + 1]);
+    for (std::size_t t = 0; t < kMarkupTagCount; ++t) {
+      const std::string_view mark = marks[t];
+      if (mark.size() < 2 || mark[1] != next || mark[0] != '<' || place[t] != std::string_view::npos) continue;
+      if (OpensAt(line, at, mark)) {
+        place[t] = at;
+        --pending;
+      }
+    }
+  }
+  return place;
+}
+
+// The value of the tag opening at `at` with `tag.open`, cut before its closing mark (the rest of
+// the line when the mark is not on it).
+void TagValue(std::string_view line, std::size_t at, const ValueTag& tag, std::string& value) {
+  if (at == std::string_view::npos) return;
+  const long start = static_cast<long>(at + tag.open.size()) + 1;
   std::string_view v;
   if (tag.close.empty()) {
     // Attribute: the quote after "=" is skipped and the value ends at the matching quote.
@@ -59,7 +113,6 @@ bool TagValue(std::string_view line, std::string_view lower, const ValueTag& tag
     if (end > 0) v = Left(v, end - 1);
   }
   value.assign(v);
-  return true;
 }
 
 // The whole text as a rounded whole number; 0 when it is not a number or out of range.
@@ -94,23 +147,24 @@ void StoreWaypoint(Molvar& m, MarkupReaderState& s) {
 }
 
 void ReadMarkupLine(Molvar& m, MarkupReaderState& s, const MarkupVocabulary& tags,
-                    std::string_view line) {
+                    const std::array<TagMarks, 2>& marks, std::string_view line) {
   if (line.empty()) return;
   try {
     const bool waypoints = m.ProgramMode == kModeConvertWaypoints;
-    const std::string lower = LCase(line);
-    if (!waypoints && Contains(lower, tags.segment)) s.NewSegment = true;
-    if (Contains(lower, waypoints ? tags.waypointStart : tags.trackStart)) s.InPoint = true;
+    const TagPlaces place = FindTags(line, marks[waypoints ? 1 : 0]);
+    const auto has = [&place](MarkupTag t) { return place[t] != std::string_view::npos; };
+    if (has(kSegmentTag)) s.NewSegment = true;
+    if (has(kStartTag)) s.InPoint = true;
     if (s.InPoint) {
-      TagValue(line, lower, tags.lat, s.lat);
-      TagValue(line, lower, tags.lon, s.lon);
-      TagValue(line, lower, tags.ele, s.ele);
-      TagValue(line, lower, tags.name, s.name);
-      TagValue(line, lower, tags.cmt, s.cmt);
-      TagValue(line, lower, tags.desc, s.desc);
-      TagValue(line, lower, tags.time, s.time);
+      TagValue(line, place[kLatTag], tags.lat, s.lat);
+      TagValue(line, place[kLonTag], tags.lon, s.lon);
+      TagValue(line, place[kEleTag], tags.ele, s.ele);
+      TagValue(line, place[kNameTag], tags.name, s.name);
+      TagValue(line, place[kCmtTag], tags.cmt, s.cmt);
+      TagValue(line, place[kDescTag], tags.desc, s.desc);
+      TagValue(line, place[kTimeTag], tags.time, s.time);
     }
-    if (Contains(lower, waypoints ? tags.waypointEnd : tags.trackEnd)) s.EndPoint = true;
+    if (has(kEndTag)) s.EndPoint = true;
     if (!s.EndPoint) return;
     // An end tag without its start tag ends nothing.
     if (s.InPoint) {
@@ -202,9 +256,9 @@ void SplitKmlTuples(std::string_view line, Take take) {
 
 }  // namespace
 
-void ReadGpxLine(Molvar& m, std::string_view line) { ReadMarkupLine(m, m.GpxReader, kGpx, line); }
+void ReadGpxLine(Molvar& m, std::string_view line) { ReadMarkupLine(m, m.GpxReader, kGpx, kGpxMarks, line); }
 
-void ReadXmlLine(Molvar& m, std::string_view line) { ReadMarkupLine(m, m.XmlReader, kXml, line); }
+void ReadXmlLine(Molvar& m, std::string_view line) { ReadMarkupLine(m, m.XmlReader, kXml, kXmlMarks, line); }
 
 void ReadKmlCoordinateLine(Molvar& m, std::string_view line) {
   if (line.empty() || Contains(line, "<")) return;

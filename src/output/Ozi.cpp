@@ -24,10 +24,10 @@ void AppendOziDegrees(std::string& line, double degrees) { AppendDouble(line, Ro
 
 }  // namespace
 
-std::string OziDateTimePart(std::string_view text, int16_t part) {
+std::string_view OziDateTimePart(std::string_view text, int16_t part) {
   const long blank = InStr(text, " ");
   if (blank == 0) return {};
-  return std::string(part == 0 ? Left(text, blank - 1) : Mid(text, blank + 1));
+  return part == 0 ? Left(text, blank - 1) : Mid(text, blank + 1);
 }
 
 std::string OziFieldText(std::string_view text) {
@@ -76,9 +76,9 @@ void WriteOziTrackPoint(Molvar& m, int32_t i) {
   if (const auto date = TextToOziDate(p.DateTime.view(), m.GmtMinutes)) {
     AppendDouble(line, date->dayNumber);
     line.append(", ");
-    line.append(OziDateTimePart(date->gmtForm, 0));
+    line.append(OziDateTimePart(date->gmtForm.view(), 0));
     line.append(", ");
-    line.append(OziDateTimePart(date->gmtForm, 1));
+    line.append(OziDateTimePart(date->gmtForm.view(), 1));
   } else {
     line.append(", , ");
   }

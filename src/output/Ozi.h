@@ -22,7 +22,7 @@ void WriteOziTrackPoint(Molvar& m, int32_t i);
 void WriteOziWaypoint(Molvar& m, int32_t k);
 // The date (selector 0) or the time (selector 1) of a timestamp: the text before or after its
 // first blank; both empty when it has no blank.
-std::string OziDateTimePart(std::string_view text, int16_t part);
+std::string_view OziDateTimePart(std::string_view text, int16_t part);
 // A text as one comma-separated field: commas become the character Ozi reads as a comma inside a
 // field (209), line breaks and other control characters become blanks.
 std::string OziFieldText(std::string_view text);

@@ -1,6 +1,10 @@
 #include "core/Numbers.h"
 
 #include <cmath>
+#include <cstdio>
+#include <cstdlib>
+#include <random>
+#include <string>
 #include <gtest/gtest.h>
 
 #include "core/Errors.h"
@@ -136,6 +140,69 @@ TEST(RoundAtDecimals, MatchesTheFormattedValue) {
   EXPECT_EQ(RoundAtDecimals(1.11198920004, 7), 1.1119892);
   EXPECT_EQ(RoundAtDecimals(66.7, 0), 67);
   EXPECT_EQ(RoundAtDecimals(-66.5, 0), -67);
+}
+
+// An independent model of the rounding rule: 15 significant digits (printf, correctly rounded),
+// then half up at the last kept decimal, as text.
+std::string ReferencePattern(double v, int decimals) {
+  char buf[64];
+  std::snprintf(buf, sizeof buf, "%.14e", std::fabs(v));
+  std::string digits;
+  digits += buf[0];
+  digits.append(buf + 2, 14);
+  const int exponent = std::atoi(buf + 17);
+  const int keep = exponent + decimals + 1;
+  std::string kept;  // the rounded magnitude times 10^decimals, as digits
+  if (keep > 0) {
+    kept = digits.substr(0, static_cast<std::size_t>(keep < 15 ? keep : 15));
+    while (static_cast<int>(kept.size()) < keep) kept += '0';
+    if (keep < 15 && digits[static_cast<std::size_t>(keep)] >= '5') {
+      int k = static_cast<int>(kept.size()) - 1;
+      while (k >= 0 && kept[static_cast<std::size_t>(k)] == '9') kept[static_cast<std::size_t>(k--)] = '0';
+      if (k >= 0) ++kept[static_cast<std::size_t>(k)];
+      else kept.insert(kept.begin(), '1');
+    }
+  } else if (keep == 0 && digits[0] >= '5') {
+    kept = "1";
+  }
+  kept.erase(0, kept.find_first_not_of('0') == std::string::npos ? kept.size() : kept.find_first_not_of('0'));
+  while (static_cast<int>(kept.size()) <= decimals) kept.insert(kept.begin(), '0');
+  std::string out = (std::signbit(v) && kept.find_first_not_of('0') != std::string::npos) ? "-" : "";
+  out += kept.substr(0, kept.size() - static_cast<std::size_t>(decimals));
+  if (decimals > 0) out += "." + kept.substr(kept.size() - static_cast<std::size_t>(decimals));
+  return out;
+}
+
+// The quick arithmetic path and the digit path must agree everywhere, near halves above all.
+TEST(RoundAtDecimals, AgreesWithTheDigitRuleOnRandomAndHalfwayValues) {
+  std::mt19937_64 random(20261207);
+  std::uniform_real_distribution<double> unit(0, 1);
+  std::uniform_int_distribution<int> magnitude(-8, 14);
+  std::uniform_int_distribution<int> places(0, 8);
+  int checked = 0;
+  for (int i = 0; i < 200000; ++i) {
+    const int d = places(random);
+    double v = unit(random) * std::pow(10.0, magnitude(random));
+    if (i % 3 == 0) v = (std::floor(v) + 0.5) / std::pow(10.0, d);              // exact-looking halves
+    if (i % 3 == 1) v = (std::floor(v * 1e3) + 0.5) / std::pow(10.0, d) + 1e-13;  // just above a half
+    if (i % 2 == 0) v = -v;
+    const std::string expected = ReferencePattern(v, d);
+    std::string text;
+    AppendPattern(text, v, 1, d);
+    ASSERT_EQ(text, expected) << "v=" << v << " decimals=" << d;
+    ASSERT_EQ(RoundAtDecimals(v, d), std::strtod(expected.c_str(), nullptr)) << "v=" << v << " decimals=" << d;
+    ++checked;
+  }
+  EXPECT_EQ(checked, 200000);
+}
+
+TEST(FormatPattern, PadsIntegerDigitsOnBothPaths) {
+  EXPECT_EQ(FormatPattern(5.25, "000.0"), "005.3");       // a half: the digit rule
+  EXPECT_EQ(FormatPattern(5.26, "000.0"), "005.3");       // plain arithmetic
+  EXPECT_EQ(FormatPattern(-0.04, "0.0"), "0.0");          // rounds to zero: no sign
+  EXPECT_EQ(FormatPattern(-0.06, "0.0"), "-0.1");
+  EXPECT_EQ(FormatPattern(0.000123, "0.000000"), "0.000123");
+  EXPECT_EQ(FormatPattern(123456.7, "0"), "123457");
 }
 
 }  // namespace
