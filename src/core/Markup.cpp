@@ -63,10 +63,22 @@ bool IsForbiddenControl(unsigned char c) { return c < 0x20 && c != '\t' && c != 
 
 enum class Context { Text, Attribute, Cdata };
 
-std::string Escape(std::string_view text, Context context, MarkupEncoding encoding) {
-  std::string out;
-  out.reserve(text.size() + 8);
+// Bytes that always pass unchanged; runs of them are copied at once.
+bool IsPlain(char c) {
+  const auto u = static_cast<unsigned char>(c);
+  return u >= 0x20 && u < 0x80 && c != '&' && c != '<' && c != '>' && c != '"' && c != ']';
+}
+
+void EscapeInto(std::string& out, std::string_view text, Context context, MarkupEncoding encoding) {
+  const std::size_t begin = out.size();
   for (std::size_t i = 0; i < text.size();) {
+    std::size_t run = i;
+    while (run < text.size() && IsPlain(text[run])) ++run;
+    if (run > i) {
+      out.append(text.data() + i, run - i);
+      i = run;
+      continue;
+    }
     const char c = text[i];
     const auto u = static_cast<unsigned char>(c);
     if (u >= 0x80 && encoding == MarkupEncoding::Utf8) {
@@ -107,11 +119,17 @@ std::string Escape(std::string_view text, Context context, MarkupEncoding encodi
       continue;
     }
     if (c == '<') out += "&lt;";
-    else if (c == '>' && out.size() >= 2 && out.compare(out.size() - 2, 2, "]]") == 0) out += "&gt;";
+    else if (c == '>' && out.size() - begin >= 2 && out.compare(out.size() - 2, 2, "]]") == 0) out += "&gt;";
     else if (c == '"' && context == Context::Attribute) out += "&quot;";
     else out += c;
     ++i;
   }
+}
+
+std::string Escape(std::string_view text, Context context, MarkupEncoding encoding) {
+  std::string out;
+  out.reserve(text.size() + 8);
+  EscapeInto(out, text, context, encoding);
   return out;
 }
 
@@ -125,6 +143,13 @@ std::string MarkupAttribute(std::string_view text, MarkupEncoding encoding) {
 }
 std::string MarkupCdata(std::string_view text, MarkupEncoding encoding) {
   return Escape(text, Context::Cdata, encoding);
+}
+
+void AppendMarkupText(std::string& out, std::string_view text, MarkupEncoding encoding) {
+  EscapeInto(out, text, Context::Text, encoding);
+}
+void AppendMarkupCdata(std::string& out, std::string_view text, MarkupEncoding encoding) {
+  EscapeInto(out, text, Context::Cdata, encoding);
 }
 
 std::string MarkupComment(std::string_view text) {

@@ -18,6 +18,9 @@ std::string MarkupText(std::string_view text, MarkupEncoding encoding = MarkupEn
 std::string MarkupAttribute(std::string_view text, MarkupEncoding encoding = MarkupEncoding::Utf8);
 // The inside of <![CDATA[ ... ]]>.
 std::string MarkupCdata(std::string_view text, MarkupEncoding encoding = MarkupEncoding::Utf8);
+// The same, appended to `out` (a line being built) without a string of its own.
+void AppendMarkupText(std::string& out, std::string_view text, MarkupEncoding encoding = MarkupEncoding::Utf8);
+void AppendMarkupCdata(std::string& out, std::string_view text, MarkupEncoding encoding = MarkupEncoding::Utf8);
 // Text inside a comment between fixed text that neither starts nor ends with "-": legal
 // characters and no "--" (written "- -").
 std::string MarkupComment(std::string_view text);

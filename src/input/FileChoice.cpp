@@ -2,11 +2,13 @@
 
 #include <array>
 #include <fstream>
-#include <iterator>
+#include <string_view>
+#include <vector>
 
 #include "app/Molvar.h"
 #include "core/Numbers.h"
 #include "core/Text.h"
+#include "output/OutputFile.h"
 #include "output/kml/KmlFrame.h"
 
 namespace molvar {
@@ -28,12 +30,6 @@ constexpr std::size_t kLongFirstLine = 300;
 
 bool InWaypointMode(const Molvar& m) { return m.ProgramMode == kModeConvertWaypoints; }
 
-std::string ReadWholeFile(const std::string& path) {
-  std::ifstream in(path, std::ios::binary);
-  if (!in) throw RuntimeError(kErrFileNotFound, "File not found: " + path);
-  return std::string(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
-}
-
 // Whether the text before the first CR (or the end) is longer than kLongFirstLine.
 bool FirstLineIsLong(const std::string& path) {
   std::ifstream in(path, std::ios::binary);
@@ -42,17 +38,6 @@ bool FirstLineIsLong(const std::string& path) {
   in.read(head.data(), static_cast<std::streamsize>(head.size()));
   head.resize(static_cast<std::size_t>(in.gcount()));
   return head.size() > kLongFirstLine && head.find('\r') == std::string::npos;
-}
-
-// Every line feed that does not follow a carriage return gets one.
-std::string WithCarriageReturns(std::string_view text) {
-  std::string out;
-  out.reserve(text.size() + text.size() / 32);
-  for (std::size_t i = 0; i < text.size(); ++i) {
-    if (text[i] == '\n' && (i == 0 || text[i - 1] != '\r')) out.push_back('\r');
-    out.push_back(text[i]);
-  }
-  return out;
 }
 
 }  // namespace
@@ -134,14 +119,39 @@ int16_t ChooseOutputFile(Molvar& m) {
 }
 
 void FixLineEnds(Molvar& m) {
+  const std::string& path = m.LastSourceFile;
   // Only a long first line asks for a look at the whole file.
-  if (!FirstLineIsLong(m.LastSourceFile)) return;
-  const std::string text = ReadWholeFile(m.LastSourceFile);
+  if (!FirstLineIsLong(path)) return;
+  std::ifstream in(path, std::ios::binary);
+  if (!in) throw RuntimeError(kErrFileNotFound, "File not found: " + path);
+  // Streamed into the replacement, so a large file costs no more memory than a small one.
+  OutputFile out;
+  out.SetDurable(true);
+  out.Open(path);
+  std::vector<char> chunk(1 << 20);
+  bool changed = false;
+  char last = 0;
+  while (in.read(chunk.data(), static_cast<std::streamsize>(chunk.size())) || in.gcount() > 0) {
+    const std::string_view data(chunk.data(), static_cast<std::size_t>(in.gcount()));
+    std::size_t from = 0;
+    for (std::size_t lf = data.find('\n'); lf != std::string_view::npos; lf = data.find('\n', from)) {
+      const char before = lf > 0 ? data[lf - 1] : last;
+      out.Raw(data.substr(from, lf - from));
+      if (before != '\r') {
+        out.Raw("\r");
+        changed = true;
+      }
+      out.Raw("\n");
+      from = lf + 1;
+    }
+    out.Raw(data.substr(from));
+    last = data.back();
+  }
+  if (in.bad()) throw RuntimeError(kErrPathFileAccess, "Path/File access error: " + path);
   // Only the line ends change; a long first line with proper line ends is left as it is.
-  std::string fixed = WithCarriageReturns(text);
-  if (fixed.size() == text.size()) return;
-  if (!fixed.empty() && fixed.back() != '\n') fixed += "\r\n";
-  WriteFileAtomically(m.LastSourceFile, fixed, true, false);
+  if (!changed) return;  // the untouched replacement is dropped
+  if (last != '\n') out.Raw("\r\n");
+  out.Close();
 }
 
 void NormaliseViewSettings(Molvar& m) {

@@ -1,6 +1,9 @@
 // Choosing input and output files, the refused format combinations and the line-end repair.
 #include <gtest/gtest.h>
 
+#include <filesystem>
+#include <iterator>
+
 #include "input/FileChoice.h"
 #include "support/TestProgram.h"
 
@@ -155,6 +158,27 @@ TEST(FixLineEnds, ShortFirstLineOrProperLineEndsLeaveTheFileAlone) {
   WriteFile(path, longLine + "\r\nsecond\r\nthird\r\n");
   FixLineEnds(*t);
   EXPECT_EQ(ReadFile(path), longLine + "\r\nsecond\r\nthird\r\n");
+}
+
+// The file is converted in pieces: a CR LF or a bare LF that meets a piece boundary is handled
+// as anywhere else, and nothing is left beside the file.
+TEST(FixLineEnds, LargeFilesAreConvertedAcrossEveryBoundary) {
+  TestProgram t;
+  const std::string path = t.folder.File("big.txt");
+  constexpr std::size_t kPiece = 1 << 20;
+  std::string text(kPiece - 1, 'a');  // no CR anywhere in the first line
+  text += "\r\nb";                    // CR the last byte of the first piece, LF the first of the next
+  text.append(kPiece - 3, 'c');
+  text += "\n\nd";                    // a bare LF ends the second piece, another begins the third
+  WriteFile(path, text);
+  t->LastSourceFile = path;
+  FixLineEnds(*t);
+  std::string expected(kPiece - 1, 'a');
+  expected += "\r\nb";
+  expected.append(kPiece - 3, 'c');
+  expected += "\r\n\r\nd\r\n";
+  EXPECT_EQ(ReadFile(path), expected);
+  EXPECT_EQ(std::distance(std::filesystem::directory_iterator(t.folder.path()), {}), 1);
 }
 
 TEST(FixLineEnds, MissingFileRaises) {

@@ -87,39 +87,70 @@ void WriteDetailedData(Molvar& m) {
     const int32_t limit = TextBoxInt(f.txtSpeedThreshold.Text);
     const TrackStore& track = m.Track;
     const int32_t count = track.StoredCount();
+    // Each line is built in the output buffer itself: a point costs no allocation.
+    std::string& line = out.Text();
+    const auto endLine = [&out] { out.EndLine(); };
     for (int32_t i = m.Detail.DetailStart; i <= count; ++i) {
       const TrackPoint& p = track[i];
       const int16_t n = NextDetailSegment(m, i);
-      out.Line("<!--  Detailed data #" + IntToText(i) + "  -->");
+      line.append("<!--  Detailed data #");
+      AppendInt(line, i);
+      line.append("  -->");
+      endLine();
       if (n > 0 && i > 1) {
         out.Line("</Document>");
         out.Line("");
         out.Line("<Document>");
-        out.Line("<name>Segment #" + IntToText(n) + "</name>");
+        line.append("<name>Segment #");
+        AppendInt(line, n);
+        line.append("</name>");
+        endLine();
       }
       out.Line("<Placemark>");
-      out.Line("  <description><![CDATA[Point no. " + IntToText(i));
+      line.append("  <description><![CDATA[Point no. ");
+      AppendInt(line, i);
+      endLine();
       const std::string_view time = p.DateTime.view();
       if (time != kNoTime) {
-        if (Contains(time, "2006-01-01")) out.Line("  <br></br>Time: " + MarkupCdata(Mid(time, 12)));
-        else out.Line("  <br></br>" + MarkupCdata(time));
+        if (Contains(time, "2006-01-01")) {
+          line.append("  <br></br>Time: ");
+          AppendMarkupCdata(line, Mid(time, 12));
+        } else {
+          line.append("  <br></br>");
+          AppendMarkupCdata(line, time);
+        }
+        endLine();
       }
-      out.Line("  <br></br>Speed: " + FormatPattern(p.Speed * m.UnitFactor, "0.0") + m.SpeedUnitLabel);
-      if (!p.PointText.view().empty()) out.Line("   <br></br>" + MarkupCdata(p.PointText.view()));
-      const std::string distance =
-          "  <br></br>Distance from start: " + FormatPattern(p.Distance * m.UnitFactor, "0.00") + m.DistanceUnitLabel;
+      line.append("  <br></br>Speed: ");
+      AppendPattern(line, p.Speed * m.UnitFactor, 1, 1);
+      line.append(m.SpeedUnitLabel);
+      endLine();
+      if (!p.PointText.view().empty()) {
+        line.append("   <br></br>");
+        AppendMarkupCdata(line, p.PointText.view());
+        endLine();
+      }
+      line.append("  <br></br>Distance from start: ");
+      AppendPattern(line, p.Distance * m.UnitFactor, 1, 2);
+      line.append(m.DistanceUnitLabel);
       if (p.Altitude > 0) {
-        out.Line(distance);
-        out.Line("  <br></br>Altitude: " + FormatPattern(p.Altitude * m.AltitudeFactor, "0") + m.AltitudeUnitLabel +
-                 "]]>");
-      } else {
-        out.Line(distance + "]]>");
+        endLine();
+        line.append("  <br></br>Altitude: ");
+        AppendPattern(line, p.Altitude * m.AltitudeFactor, 1, 0);
+        line.append(m.AltitudeUnitLabel);
       }
+      line.append("]]>");
+      endLine();
       if (m.ColorVaryMode == 3 && m.TrackFileType != 8) {
         if (p.ColorBand >= 0 && p.ColorBand <= 9) {
-          out.Line(std::string("    <br></br>GPS quality: ") + kQuality[static_cast<std::size_t>(p.ColorBand)]);
+          line.append("    <br></br>GPS quality: ");
+          line.append(kQuality[static_cast<std::size_t>(p.ColorBand)]);
+          endLine();
         }
-        out.Line(" (" + IntToText(p.ColorBand) + ")");
+        line.append(" (");
+        AppendInt(line, p.ColorBand);
+        line.append(")");
+        endLine();
       }
       out.Line("  </description>");
       out.Line("  <styleUrl>#dot</styleUrl>");
@@ -131,11 +162,10 @@ void WriteDetailedData(Molvar& m) {
       if (m.TrackFileType == 4 && p.ColorBand > 0) WriteKmlStyle(m, p.ColorBand);
       out.Line("  <Point>");
       InsertAltitudeMode(m, p.Altitude);
-      std::string& line = out.Text();
       line.append("    <coordinates>");
       AppendKmlCoordinate(m, p, line);
       line.append("</coordinates>");
-      out.EndLine();
+      endLine();
       out.Line("  </Point>");
       out.Line("</Placemark>");
       out.Line("");
