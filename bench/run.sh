@@ -16,6 +16,12 @@ for fmt in gpx nmea plt; do
   [[ -s "$file" ]] || python3 "$top/bench/make-track.py" "$fmt" "$points" "$file"
 done
 
+# The first read of a file with bare LF line ends rewrites it with CR LF; do that before timing.
+for fmt in gpx nmea plt; do
+  type=$fmt; [[ $fmt == plt ]] && type=ozi
+  "$convert" --folder "$data/folder" --type "$type" --set chkDetailed=0 "$data/track-$points.$fmt" "$data/warm.kml" >/dev/null
+done
+
 # One measurement: "seconds peak-kB" of a command, its output discarded.
 measure() {
   /usr/bin/time -f "%e %M" -o "$data/time.txt" "$@" >/dev/null 2>&1 || true
@@ -46,6 +52,8 @@ compare() {  # label input output-extension molvar-options... -- gpsbabel-args..
   read -r s1 k1 < <(median "$convert" --folder "$data/folder" "${ours[@]}" "$in" "$data/out.$ext")
   read -r s2 k2 < <(median gpsbabel "${theirs[@]}")
   row "molvar  $label" "$in" "$s1" "$k1"
+  awk -v s="$s1" -v b="$(stat -c %s "$data/out.$ext")" \
+    'BEGIN {printf "%-34s %8.1f MB written, %.1f MB/s\n", "  output", b / 1e6, (s > 0 ? b / 1e6 / s : 0)}'
   row "gpsbabel $label" "$in" "$s2" "$k2"
   awk -v a="$s1" -v b="$s2" 'BEGIN {printf "%-34s %8.1fx\n", "  ratio (gpsbabel / molvar)", (a > 0 ? b / a : 0)}'
 }
@@ -61,3 +69,16 @@ compare "GPX -> KML, details on" "$gpx" kml -- -i gpx -f "$gpx" -o kml -F "$data
 compare "GPX -> PLT" "$gpx" plt -- -i gpx -f "$gpx" -o ozi -F "$data/babel.plt"
 compare "NMEA -> KML" "$nmea" kml --type nmea --set chkDetailed=0 -- -i nmea -f "$nmea" -o kml -F "$data/babel.kml"
 compare "PLT -> KML" "$plt" kml --set chkDetailed=0 -- -i ozi -f "$plt" -o kml -F "$data/babel.kml"
+compare "NMEA -> GPX" "$nmea" gpx --type nmea -- -i nmea -f "$nmea" -o gpx -F "$data/babel.gpx"
+compare "PLT -> GPX" "$plt" gpx -- -i ozi -f "$plt" -o gpx -F "$data/babel.gpx"
+# gpsbabel's own GPX -> GPX (which we refuse) for scale.
+read -r s k < <(median gpsbabel -i gpx -f "$gpx" -o gpx -F "$data/babel.gpx")
+row "gpsbabel GPX -> GPX (scale)" "$gpx" "$s" "$k"
+
+# Peak memory per stored point above an empty run's baseline.
+read -r _ base < <(median "$convert" --folder "$data/folder" "$top/resources/Samples/sample.gpx" "$data/empty.kml")
+read -r _ full < <(median "$convert" --folder "$data/folder" --set chkDetailed=0 "$gpx" "$data/out.kml")
+awk -v b="$base" -v f="$full" -v n="$points" \
+  'BEGIN {printf "%-34s %8.1f bytes per point (%.1f MB baseline)\n", "memory above baseline", (f - b) * 1024 / n, b / 1024}'
+echo
+"$top/$build/molvar-bench-live" "$data/live"

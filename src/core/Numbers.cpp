@@ -3,6 +3,7 @@
 #include <array>
 #include <charconv>
 #include <cmath>
+#include <cstdint>
 #include <cstring>
 
 #include "core/Errors.h"
@@ -40,12 +41,39 @@ std::size_t NumberSpan(std::string_view s, bool& hasDigits) {
   return i;
 }
 
+// A plain decimal of at most 15 digits: the digits are an exact integer and 10^fraction an exact
+// power, so their quotient is the correctly rounded value (Clinger's fast path), as from_chars
+// would give it. False for anything else.
+bool ParseShortDecimal(std::string_view span, double& value) {
+  static constexpr std::array<double, 16> kTens = {1e0, 1e1, 1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
+                                                   1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
+  uint64_t digits = 0;
+  int count = 0, fraction = 0;
+  bool point = false;
+  for (const char c : span) {
+    if (c == '.' && !point) {
+      point = true;
+      continue;
+    }
+    if (!IsDigit(c) || ++count > 15) return false;
+    digits = digits * 10 + static_cast<uint64_t>(c - '0');
+    if (point) ++fraction;
+  }
+  if (count == 0) return false;
+  value = static_cast<double>(digits) / kTens[static_cast<std::size_t>(fraction)];
+  return true;
+}
+
 // Parses a span found by NumberSpan; from_chars rejects a leading "+" and a bare leading ".".
 bool ParseSpan(std::string_view span, double& value) {
   bool negative = false;
   if (!span.empty() && (span[0] == '+' || span[0] == '-')) {
     negative = span[0] == '-';
     span.remove_prefix(1);
+  }
+  if (double quick = 0; ParseShortDecimal(span, quick)) {
+    value = negative ? -quick : quick;
+    return true;
   }
   std::array<char, 64> small{};
   std::string big;

@@ -1,6 +1,8 @@
 #include "input/XmlTracks.h"
 
 #include <array>
+#include <bit>
+#include <cstdint>
 
 #include "app/Molvar.h"
 #include "core/DateTime.h"
@@ -53,9 +55,29 @@ constexpr MarkupVocabulary kXml{
     {"<altitude>", "</altitude>"}, {"<name>", "</name>"}, {"<comment>", "</comment>"},
     {"<description>", "</description>"}, {"<time>", "</time>"}};
 
-// The marks of each vocabulary for tracks [0] and waypoints [1].
-constexpr std::array<TagMarks, 2> kGpxMarks = {kGpx.Marks(false), kGpx.Marks(true)};
-constexpr std::array<TagMarks, 2> kXmlMarks = {kXml.Marks(false), kXml.Marks(true)};
+// The marks of one reading, with the tags that open with "<" indexed by the (lower-case)
+// character after it, so a "<" on the line is compared with the few tags it can begin.
+struct TagIndex {
+  TagMarks marks;
+  std::array<uint16_t, 256> bySecondChar{};  // bit t: tag t
+  uint16_t angleTags = 0;
+};
+
+constexpr TagIndex IndexTags(const TagMarks& marks) {
+  TagIndex index{marks};
+  for (std::size_t t = 0; t < kMarkupTagCount; ++t) {
+    const std::string_view mark = marks[t];
+    if (mark.size() < 2 || mark.front() != '<') continue;
+    const auto bit = static_cast<uint16_t>(1U << t);
+    index.angleTags |= bit;
+    index.bySecondChar[static_cast<unsigned char>(mark[1])] |= bit;
+  }
+  return index;
+}
+
+// For tracks [0] and waypoints [1].
+constexpr std::array<TagIndex, 2> kGpxMarks = {IndexTags(kGpx.Marks(false)), IndexTags(kGpx.Marks(true))};
+constexpr std::array<TagIndex, 2> kXmlMarks = {IndexTags(kXml.Marks(false)), IndexTags(kXml.Marks(true))};
 
 
 // The tags that open with "<" are all found in one pass over the line's "<" characters; the
@@ -68,27 +90,28 @@ bool OpensAt(std::string_view line, std::size_t at, std::string_view mark) {
   return true;
 }
 
-TagPlaces FindTags(std::string_view line, const TagMarks& marks) {
+TagPlaces FindTags(std::string_view line, const TagIndex& index) {
   TagPlaces place;
   place.fill(std::string_view::npos);
-  std::size_t pending = 0;  // tags opening with "<" not found yet
+  const TagMarks& marks = index.marks;
+  const bool hasEquals = line.find('=') != std::string_view::npos;  // every attribute mark holds one
   for (std::size_t t = 0; t < kMarkupTagCount; ++t) {
-    if (marks[t].empty()) continue;
-    if (marks[t].front() == '<') {
-      ++pending;
-    } else {
-      const long p = InStrNoCase(line, marks[t]);
-      if (p != 0) place[t] = static_cast<std::size_t>(p - 1);
-    }
+    const std::string_view mark = marks[t];
+    if (mark.empty() || (index.angleTags >> t & 1U) != 0) continue;
+    if (!hasEquals && mark.find('=') != std::string_view::npos) continue;
+    const long p = InStrNoCase(line, mark);
+    if (p != 0) place[t] = static_cast<std::size_t>(p - 1);
   }
-  for (std::size_t at = line.find('<'); pending > 0 && at != std::string_view::npos && at + 1 < line.size(); at = line.find('<', at + 1)) {
-    const char next = LowerChar(line[at + 1]);
-    for (std::size_t t = 0; t < kMarkupTagCount; ++t) {
-      const std::string_view mark = marks[t];
-      if (mark.size() < 2 || mark[1] != next || mark[0] != '<' || place[t] != std::string_view::npos) continue;
-      if (OpensAt(line, at, mark)) {
+  unsigned wanted = index.angleTags;  // not found yet
+  for (std::size_t at = line.find('<'); wanted != 0 && at != std::string_view::npos && at + 1 < line.size();
+       at = line.find('<', at + 1)) {
+    unsigned candidates = index.bySecondChar[static_cast<unsigned char>(LowerChar(line[at + 1]))] & wanted;
+    while (candidates != 0) {
+      const auto t = static_cast<std::size_t>(std::countr_zero(candidates));
+      candidates &= candidates - 1;
+      if (OpensAt(line, at, marks[t])) {
         place[t] = at;
-        --pending;
+        wanted &= ~(1U << t);
       }
     }
   }
@@ -147,7 +170,7 @@ void StoreWaypoint(Molvar& m, MarkupReaderState& s) {
 }
 
 void ReadMarkupLine(Molvar& m, MarkupReaderState& s, const MarkupVocabulary& tags,
-                    const std::array<TagMarks, 2>& marks, std::string_view line) {
+                    const std::array<TagIndex, 2>& marks, std::string_view line) {
   if (line.empty()) return;
   try {
     const bool waypoints = m.ProgramMode == kModeConvertWaypoints;

@@ -196,6 +196,27 @@ TEST(RoundAtDecimals, AgreesWithTheDigitRuleOnRandomAndHalfwayValues) {
   EXPECT_EQ(checked, 200000);
 }
 
+// Short decimals take a quick path; every one must read as the C library reads it.
+TEST(Val, ShortDecimalsReadAsTheLibraryReadsThem) {
+  std::mt19937_64 random(7);
+  std::uniform_int_distribution<int> length(1, 17);
+  std::uniform_int_distribution<int> digit(0, 9);
+  for (int i = 0; i < 200000; ++i) {
+    std::string text = i % 2 ? "-" : "";
+    const int n = length(random);
+    const int point = std::uniform_int_distribution<int>(0, n)(random);
+    for (int k = 0; k < n; ++k) {
+      if (k == point) text += '.';
+      text += static_cast<char>('0' + digit(random));
+    }
+    ASSERT_EQ(Val(text), std::strtod(text.c_str(), nullptr)) << text;
+  }
+  EXPECT_EQ(Val(".5"), 0.5);
+  EXPECT_EQ(Val("5."), 5.0);
+  EXPECT_TRUE(std::signbit(Val("-0.0")));
+  EXPECT_EQ(Val("45.4215001"), 45.4215001);
+}
+
 TEST(FormatPattern, PadsIntegerDigitsOnBothPaths) {
   EXPECT_EQ(FormatPattern(5.25, "000.0"), "005.3");       // a half: the digit rule
   EXPECT_EQ(FormatPattern(5.26, "000.0"), "005.3");       // plain arithmetic
