@@ -389,15 +389,24 @@ int64_t SecondsBetween(std::string_view from, std::string_view to) {
   return ParseDateTimeOrThrow(to) - ParseDateTimeOrThrow(from);
 }
 
-std::string ShiftedTimestamp(std::string_view text, int minutes) {
+namespace {
+
+std::optional<TimestampText> ShiftedStamp(std::string_view text, int minutes) {
   const auto t = ParseDateTime(text);
-  if (!t) return {};
+  if (!t) return std::nullopt;
   const TimeSeconds shifted = *t + static_cast<TimeSeconds>(minutes) * 60;
-  if (!InDateRange(shifted)) return {};
-  return FormatTimestamp(shifted);
+  if (!InDateRange(shifted)) return std::nullopt;
+  return MakeTimestamp(shifted);
 }
 
-std::string OziDateToText(std::string_view field, int gmtMinutes) {
+}  // namespace
+
+std::string ShiftedTimestamp(std::string_view text, int minutes) {
+  const auto stamp = ShiftedStamp(text, minutes);
+  return stamp ? std::string(stamp->view()) : std::string();
+}
+
+CompactString OziDateToText(std::string_view field, int gmtMinutes) {
   field = Trim(field);
   if (field.empty()) return {};
   // Whole days before the point, the fraction of a day after it.
@@ -409,7 +418,7 @@ std::string OziDateToText(std::string_view field, int gmtMinutes) {
   const TimeSeconds t = static_cast<TimeSeconds>(days) * kSecondsPerDay +
                         static_cast<TimeSeconds>(gmtMinutes) * 60 + static_cast<TimeSeconds>(seconds);
   if (!InDateRange(t)) return {};
-  return FormatTimestamp(t);
+  return CompactString(MakeTimestamp(t).view());
 }
 
 std::optional<OziDate> TextToOziDate(std::string_view text, int gmtMinutes) {
@@ -483,24 +492,29 @@ CompactString IsoTimeToTimestamp(std::string_view elementText, int gmtMinutes) {
   return CompactString(ShiftedTimestamp(joined, gmtMinutes));
 }
 
-std::string NmeaTimeToTimestamp(std::string_view time, std::string_view date, int gmtMinutes) {
+CompactString NmeaTimeToTimestamp(std::string_view time, std::string_view date, int gmtMinutes) {
   if (time.empty()) time = "000000";
   if (date.empty()) date = "010106";
-  std::string text;
-  text.reserve(20);
-  text.append("20");
-  text.append(Mid(date, 5, 2));
-  text.push_back('-');
-  text.append(Mid(date, 3, 2));
-  text.push_back('-');
-  text.append(Mid(date, 1, 2));
-  text.push_back(' ');
-  text.append(Mid(time, 1, 2));
-  text.push_back(':');
-  text.append(Mid(time, 3, 2));
-  text.push_back(':');
-  text.append(Mid(time, 5, 2));
-  return ShiftedTimestamp(text, gmtMinutes);
+  // "20yy-mm-dd hh:nn:ss" from the fields, built without an allocation.
+  std::array<char, 32> text{};
+  std::size_t n = 0;
+  const auto put = [&](std::string_view part) {
+    for (const char c : part) text[n++] = c;
+  };
+  put("20");
+  put(Mid(date, 5, 2));
+  put("-");
+  put(Mid(date, 3, 2));
+  put("-");
+  put(Mid(date, 1, 2));
+  put(" ");
+  put(Mid(time, 1, 2));
+  put(":");
+  put(Mid(time, 3, 2));
+  put(":");
+  put(Mid(time, 5, 2));
+  const auto stamp = ShiftedStamp(std::string_view(text.data(), n), gmtMinutes);
+  return stamp ? CompactString(stamp->view()) : CompactString();
 }
 
 int16_t GmtMinutesFromHours(double hours) { return RoundToInt16(hours * 60); }

@@ -57,7 +57,7 @@ std::string ShiftedTimestamp(std::string_view text, int minutes);
 
 // An Ozi day-number field (days since the epoch with a decimal fraction) in local time.
 // Empty text gives empty text.
-std::string OziDateToText(std::string_view field, int gmtMinutes);
+CompactString OziDateToText(std::string_view field, int gmtMinutes);
 
 // The Ozi day number (six decimals) of a stored timestamp, and its GMT form for the date and time
 // fields; nothing when the text is not a date.
@@ -81,7 +81,7 @@ CompactString IsoTimeToTimestamp(std::string_view elementText, int gmtMinutes);
 
 // NMEA time (hhmmss) and date (ddmmyy) fields as a local timestamp; empty fields count as
 // "000000" and "010106"; empty result when unreadable.
-std::string NmeaTimeToTimestamp(std::string_view time, std::string_view date, int gmtMinutes);
+CompactString NmeaTimeToTimestamp(std::string_view time, std::string_view date, int gmtMinutes);
 
 // GmtMinutes of a GMT offset in hours: hours × 60 to the nearest minute, ties to even.
 int16_t GmtMinutesFromHours(double hours);

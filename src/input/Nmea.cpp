@@ -139,12 +139,12 @@ bool StoresSentencePoints(const Molvar& m) {
 
 // The time of a parsed fix: the converted time and date texts, or DefaultTimestamp when either is
 // missing or holds the no-time placeholders (the placeholders are not shifted by the GMT offset).
-std::string ParsedPointTime(const NmeaFields& n, int gmtMinutes) {
+CompactString ParsedPointTime(const NmeaFields& n, int gmtMinutes) {
   if (n.UtcTime.empty() || n.DateText.empty() || (n.UtcTime == kNoTime && n.DateText == kNoDate)) {
-    return std::string(kDefaultTimestamp);
+    return CompactString(kDefaultTimestamp);
   }
-  std::string t = NmeaTimeToTimestamp(n.UtcTime, n.DateText, gmtMinutes);
-  return t.empty() ? std::string(kDefaultTimestamp) : t;
+  CompactString t = NmeaTimeToTimestamp(n.UtcTime, n.DateText, gmtMinutes);
+  return t.empty() ? CompactString(kDefaultTimestamp) : t;
 }
 
 }  // namespace
@@ -159,10 +159,18 @@ void ParseNMEA(Molvar& m, std::string& sentence) {
       fix.NmeaValid = 0;
       return;
     }
-    std::string text = UCase(Trim(Mid(sentence, dollar)));
+    // Cut and upper-cased in place: the caller's buffer keeps its storage from line to line.
+    std::string_view text = Trim(Mid(sentence, dollar));
     const long lineEnd = InStr(text, "\r\n");
-    if (lineEnd > 1) text.resize(static_cast<std::size_t>(lineEnd - 1));
-    sentence = std::move(text);
+    if (lineEnd > 1) text = text.substr(0, static_cast<std::size_t>(lineEnd - 1));
+    if (text.empty()) {
+      sentence.clear();
+    } else {
+      const auto offset = static_cast<std::size_t>(text.data() - sentence.data());
+      sentence.erase(offset + text.size());
+      sentence.erase(0, offset);
+    }
+    for (char& c : sentence) c = UpperChar(c);
 
     const bool rmc = StartsWith(sentence, kRmc);
     if (!rmc && !StartsWith(sentence, kGga)) {

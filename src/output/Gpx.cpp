@@ -35,13 +35,18 @@ void CdataLine(OutputFile& out, std::string_view element, std::string_view text)
 
 }  // namespace
 
-std::string GpxTime(const Molvar& m, std::string_view timestamp) {
+bool AppendGpxTime(std::string& out, const Molvar& m, std::string_view timestamp) {
   const auto local = ParseDateTime(timestamp);
-  if (!local) return {};
+  if (!local) return false;
   const TimeSeconds utc = *local - static_cast<TimeSeconds>(m.GmtMinutes) * 60;
-  if (!InDateRange(utc)) return {};
-  std::string out;
+  if (!InDateRange(utc)) return false;
   AppendIsoUtc(out, utc);
+  return true;
+}
+
+std::string GpxTime(const Molvar& m, std::string_view timestamp) {
+  std::string out;
+  AppendGpxTime(out, m, timestamp);
   return out;
 }
 
@@ -101,8 +106,14 @@ void WriteGpxSegment(Molvar& m, int32_t startIndex, int32_t count) {
     AppendInt(line, p.Altitude);
     line.append("</ele>");
     out.EndLine();
-    const std::string time = GpxTime(m, p.DateTime.view());
-    if (!time.empty()) out.Line("    <time>" + time + "</time>");
+    const std::size_t before = line.size();
+    line.append("    <time>");
+    if (AppendGpxTime(line, m, p.DateTime.view())) {
+      line.append("</time>");
+      out.EndLine();
+    } else {
+      line.resize(before);  // no time element for a point without a readable time
+    }
     out.Line("  </trkpt>");
   }
   out.Line("</trkseg>");

@@ -27,5 +27,7 @@ void WriteGpxFooter(Molvar& m);
 // A stored (local) timestamp as GPX UTC time "yyyy-mm-ddThh:mm:ssZ"; empty when the text is not
 // a date.
 std::string GpxTime(const Molvar& m, std::string_view timestamp);
+// The same appended to `out`; false, with nothing appended, when there is no time to write.
+bool AppendGpxTime(std::string& out, const Molvar& m, std::string_view timestamp);
 
 }  // namespace molvar
