@@ -211,7 +211,7 @@ bool RoundScaledFast(double v, int decimals, uint64_t& scaled) {
   if (!std::isfinite(v) || decimals < 0 || decimals >= static_cast<int>(kPowersOfTen.size())) return false;
   const double x = std::fabs(v) * kPowersOfTen[static_cast<std::size_t>(decimals)];
   if (x < 1 || x >= 1e13) return false;
-  const double whole = std::floor(x);
+  const double whole = static_cast<double>(static_cast<int64_t>(x));  // floor: x is positive and small
   const double fraction = x - whole;
   if (std::fabs(fraction - 0.5) <= 0.01) return false;
   scaled = static_cast<uint64_t>(fraction < 0.5 ? whole : whole + 1);

@@ -4,7 +4,7 @@
 
 namespace molvar {
 
-void TrackStore::GrowTrackStore(int32_t n) {
+void TrackStore::Resize(int32_t n) {
   if (n < 0) throw RuntimeError(kErrSubscript);
   const auto blocksNeeded = static_cast<std::size_t>((static_cast<int64_t>(n) + kBlockSize - 1) >> kBlockShift);
   while (blocks_.size() < blocksNeeded) {

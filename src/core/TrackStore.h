@@ -32,7 +32,15 @@ class TrackStore {
 
   // Makes elements 1..n exist: elements up to the old bound keep their values, new ones start as
   // 0 or empty; elements beyond n are dropped.
-  void GrowTrackStore(int32_t n);
+  void GrowTrackStore(int32_t n) {
+    // One more point into a block that exists: what every reader does for every point.
+    if (n == bound_ + 1 && static_cast<std::size_t>(bound_ >> kBlockShift) < blocks_.size()) {
+      Slot(n) = TrackPoint{};
+      bound_ = n;
+      return;
+    }
+    Resize(n);
+  }
   // PointCount 0 and a fresh point 1; the other elements stay until they are dropped or regrown.
   void Restart();
 
@@ -57,6 +65,8 @@ class TrackStore {
     const auto k = static_cast<std::size_t>(i - 1);
     return blocks_[k >> kBlockShift][k & (kBlockSize - 1)];
   }
+
+  void Resize(int32_t n);
 
   std::vector<std::unique_ptr<TrackPoint[]>> blocks_;
   int32_t bound_ = 0;
