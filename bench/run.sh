@@ -9,6 +9,10 @@ convert="$top/$build/molvar-convert"
 points=${BENCH_POINTS:-1000000}
 runs=${RUNS:-3}
 data=${BENCH_DIR:-$top/bench/data}
+# Outputs go to memory (tmpfs) when there is one, so the figures measure the programs rather than
+# a shared disk's write-back; BENCH_OUT chooses another place.
+out=${BENCH_OUT:-/dev/shm/molvar-bench}
+mkdir -p "$out" 2>/dev/null || out=$data
 mkdir -p "$data/folder"
 
 for fmt in gpx nmea plt; do
@@ -19,7 +23,7 @@ done
 # The first read of a file with bare LF line ends rewrites it with CR LF; do that before timing.
 for fmt in gpx nmea plt; do
   type=$fmt; [[ $fmt == plt ]] && type=ozi
-  "$convert" --folder "$data/folder" --type "$type" --set chkDetailed=0 "$data/track-$points.$fmt" "$data/warm.kml" >/dev/null
+  "$convert" --folder "$data/folder" --type "$type" --set chkDetailed=0 "$data/track-$points.$fmt" "$out/warm.kml" >/dev/null
 done
 
 # One measurement: "seconds peak-kB" of a command, its output discarded.
@@ -49,10 +53,10 @@ compare() {  # label input output-extension molvar-options... -- gpsbabel-args..
   while [[ $1 != -- ]]; do ours+=("$1"); shift; done
   shift
   theirs=("$@")
-  read -r s1 k1 < <(median "$convert" --folder "$data/folder" "${ours[@]}" "$in" "$data/out.$ext")
+  read -r s1 k1 < <(median "$convert" --folder "$data/folder" "${ours[@]}" "$in" "$out/out.$ext")
   read -r s2 k2 < <(median gpsbabel "${theirs[@]}")
   row "molvar  $label" "$in" "$s1" "$k1"
-  awk -v s="$s1" -v b="$(stat -c %s "$data/out.$ext")" \
+  awk -v s="$s1" -v b="$(stat -c %s "$out/out.$ext")" \
     'BEGIN {printf "%-34s %8.1f MB written, %.1f MB/s\n", "  output", b / 1e6, (s > 0 ? b / 1e6 / s : 0)}'
   row "gpsbabel $label" "$in" "$s2" "$k2"
   awk -v a="$s1" -v b="$s2" 'BEGIN {printf "%-34s %8.1fx\n", "  ratio (gpsbabel / molvar)", (a > 0 ? b / a : 0)}'
@@ -64,21 +68,22 @@ plt="$data/track-$points.plt"
 echo "Tracks of $points points; medians of $runs runs."
 read -r s k < <(median wc -l "$gpx")
 row "wc -l (floor)" "$gpx" "$s" "$k"
-compare "GPX -> KML, details off" "$gpx" kml --set chkDetailed=0 -- -i gpx -f "$gpx" -o kml -F "$data/babel.kml"
-compare "GPX -> KML, details on" "$gpx" kml -- -i gpx -f "$gpx" -o kml -F "$data/babel.kml"
-compare "GPX -> PLT" "$gpx" plt -- -i gpx -f "$gpx" -o ozi -F "$data/babel.plt"
-compare "NMEA -> KML" "$nmea" kml --type nmea --set chkDetailed=0 -- -i nmea -f "$nmea" -o kml -F "$data/babel.kml"
-compare "PLT -> KML" "$plt" kml --set chkDetailed=0 -- -i ozi -f "$plt" -o kml -F "$data/babel.kml"
-compare "NMEA -> GPX" "$nmea" gpx --type nmea -- -i nmea -f "$nmea" -o gpx -F "$data/babel.gpx"
-compare "PLT -> GPX" "$plt" gpx -- -i ozi -f "$plt" -o gpx -F "$data/babel.gpx"
+compare "GPX -> KML, details off" "$gpx" kml --set chkDetailed=0 -- -i gpx -f "$gpx" -o kml -F "$out/babel.kml"
+compare "GPX -> KML, details on" "$gpx" kml -- -i gpx -f "$gpx" -o kml -F "$out/babel.kml"
+compare "GPX -> PLT" "$gpx" plt -- -i gpx -f "$gpx" -o ozi -F "$out/babel.plt"
+compare "NMEA -> KML" "$nmea" kml --type nmea --set chkDetailed=0 -- -i nmea -f "$nmea" -o kml -F "$out/babel.kml"
+compare "PLT -> KML" "$plt" kml --set chkDetailed=0 -- -i ozi -f "$plt" -o kml -F "$out/babel.kml"
+compare "NMEA -> GPX" "$nmea" gpx --type nmea -- -i nmea -f "$nmea" -o gpx -F "$out/babel.gpx"
+compare "PLT -> GPX" "$plt" gpx -- -i ozi -f "$plt" -o gpx -F "$out/babel.gpx"
 # gpsbabel's own GPX -> GPX (which we refuse) for scale.
-read -r s k < <(median gpsbabel -i gpx -f "$gpx" -o gpx -F "$data/babel.gpx")
+read -r s k < <(median gpsbabel -i gpx -f "$gpx" -o gpx -F "$out/babel.gpx")
 row "gpsbabel GPX -> GPX (scale)" "$gpx" "$s" "$k"
 
 # Peak memory per stored point above an empty run's baseline.
-read -r _ base < <(median "$convert" --folder "$data/folder" "$top/resources/Samples/sample.gpx" "$data/empty.kml")
-read -r _ full < <(median "$convert" --folder "$data/folder" --set chkDetailed=0 "$gpx" "$data/out.kml")
+read -r _ base < <(median "$convert" --folder "$data/folder" "$top/resources/Samples/sample.gpx" "$out/empty.kml")
+read -r _ full < <(median "$convert" --folder "$data/folder" --set chkDetailed=0 "$gpx" "$out/out.kml")
 awk -v b="$base" -v f="$full" -v n="$points" \
   'BEGIN {printf "%-34s %8.1f bytes per point (%.1f MB baseline)\n", "memory above baseline", (f - b) * 1024 / n, b / 1024}'
 echo
-"$top/$build/molvar-bench-live" "$data/live"
+"$top/$build/molvar-bench-live" "$out/live"
+rm -rf "$out"/out.* "$out"/babel.* "$out"/warm.kml "$out"/empty.kml "$out"/live
