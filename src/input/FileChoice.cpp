@@ -1,6 +1,8 @@
 #include "input/FileChoice.h"
 
 #include <array>
+#include <cerrno>
+#include <cstring>
 #include <fstream>
 #include <iterator>
 
@@ -26,18 +28,27 @@ constexpr std::array<std::string_view, kTrackFileTypeCount> kTrackFilters = {
 
 constexpr std::size_t kLongFirstLine = 300;
 
+// The same message the line reader gives: the file and the system's reason.
+[[noreturn]] void ThrowOpenFailure(const std::string& path) {
+  const int err = errno != 0 ? errno : ENOENT;
+  const int number = err == ENOENT ? kErrFileNotFound : kErrPathFileAccess;
+  throw RuntimeError(number, RuntimeError::StandardDescription(number) + " (" + path + ": " + std::strerror(err) + ")");
+}
+
 bool InWaypointMode(const Molvar& m) { return m.ProgramMode == kModeConvertWaypoints; }
 
 std::string ReadWholeFile(const std::string& path) {
+  errno = 0;
   std::ifstream in(path, std::ios::binary);
-  if (!in) throw RuntimeError(kErrFileNotFound, "File not found: " + path);
+  if (!in) ThrowOpenFailure(path);
   return std::string(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
 }
 
 // Whether the text before the first CR (or the end) is longer than kLongFirstLine.
 bool FirstLineIsLong(const std::string& path) {
+  errno = 0;
   std::ifstream in(path, std::ios::binary);
-  if (!in) throw RuntimeError(kErrFileNotFound, "File not found: " + path);
+  if (!in) ThrowOpenFailure(path);
   std::string head(kLongFirstLine + 1, '\0');
   in.read(head.data(), static_cast<std::streamsize>(head.size()));
   head.resize(static_cast<std::size_t>(in.gcount()));

@@ -8,13 +8,16 @@
 namespace molvar {
 namespace {
 constexpr std::size_t kChunk = 1 << 20;
-}
 
-LineReader::LineReader(const std::string& path) : file_(std::fopen(path.c_str(), "rb")) {
+[[noreturn]] void Fail(const std::string& path, int number, int err) {
+  throw RuntimeError(number, RuntimeError::StandardDescription(number) + " (" + path + ": " + std::strerror(err) + ")");
+}
+}  // namespace
+
+LineReader::LineReader(const std::string& path) : path_(path), file_(std::fopen(path.c_str(), "rb")) {
   if (!file_) {
     const int err = errno;
-    const int number = err == ENOENT ? kErrFileNotFound : kErrPathFileAccess;
-    throw RuntimeError(number, RuntimeError::StandardDescription(number) + " (" + path + ": " + std::strerror(err) + ")");
+    Fail(path, err == ENOENT ? kErrFileNotFound : kErrPathFileAccess, err);
   }
 }
 
@@ -24,9 +27,14 @@ bool LineReader::Fill() {
   pos_ = 0;
   const std::size_t old = buffer_.size();
   buffer_.resize(old + kChunk);
+  errno = 0;
   const std::size_t got = std::fread(buffer_.data() + old, 1, kChunk, file_.get());
+  const int err = errno;
   buffer_.resize(old + got);
-  if (got < kChunk) eof_ = true;
+  if (got < kChunk) {
+    if (std::ferror(file_.get())) Fail(path_, kErrPathFileAccess, err != 0 ? err : EIO);
+    eof_ = true;
+  }
   return got > 0;
 }
 

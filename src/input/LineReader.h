@@ -15,7 +15,9 @@ class LineReader {
   // Raises RuntimeError "File not found" (53) or "Path/File access error" (75) naming the path.
   explicit LineReader(const std::string& path);
 
-  // The next line without its line end; false at the end of the file.
+  // The next line without its line end; false at the end of the file. A failed read (a folder,
+  // a device error) raises RuntimeError 75 naming the path and the reason instead of passing for
+  // the end of the file.
   bool Next(std::string& line);
 
  private:
@@ -24,6 +26,7 @@ class LineReader {
   struct Closer {
     void operator()(std::FILE* f) const { std::fclose(f); }
   };
+  std::string path_;
   std::unique_ptr<std::FILE, Closer> file_;
   std::string buffer_;
   std::size_t pos_ = 0;
