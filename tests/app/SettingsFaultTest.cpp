@@ -35,7 +35,7 @@ struct Session : TestProgram {
   std::string Ini() const { return folder.File(kSettingsFileName); }
   std::string TrackData() const { return folder.File(kTrackDataFileName); }
   // Everything the program folder holds after the start: no temporary file may join it.
-  std::vector<std::string> names = {kAgwpeFileName, kSettingsFileName, kTrackDataFileName};
+  std::vector<std::string> names = {kSettingsFileName, kTrackDataFileName, kAgwpeFileName};  // sorted
 };
 
 TEST(SettingsFault, DiskFullAtEveryStageOfTheSettingsFile) {
@@ -134,7 +134,7 @@ TEST(SettingsFault, SettingsFileThatIsAFolder) {
   EXPECT_TRUE(StartsWith(boxes[1].text, "SaveSettings bug ")) << boxes[1].text;
   EXPECT_TRUE(Contains(boxes[1].text, t.folder.File(kSettingsFileName))) << boxes[1].text;
   EXPECT_EQ(ReadFile(t.folder.File("Molvar.ini/keep")), "user data");
-  EXPECT_EQ(NamesIn(t.folder.path()), (std::vector<std::string>{kAgwpeFileName, kSettingsFileName}));
+  EXPECT_EQ(NamesIn(t.folder.path()), (std::vector<std::string>{kSettingsFileName, kAgwpeFileName}));
 }
 
 // A Molvar.ini the program may not read: as the settings file is rewritten at every close, the

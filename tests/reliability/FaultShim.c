@@ -138,7 +138,8 @@ size_t fread(void* data, size_t size, size_t count, FILE* f) {
   if (f == truncate_target && got > 0) {
     truncate_target = NULL;
     const char* to = env("MOLVAR_FAULT_TRUNCATE_TO");
-    if (ftruncate(fileno(f), to != NULL ? atoll(to) : 0) != 0) abort();
+    /* By name: the descriptor is open for reading only. */
+    if (truncate(env("MOLVAR_FAULT_TRUNCATE_PATH"), to != NULL ? atoll(to) : 0) != 0) abort();
   }
   return got;
 }

@@ -33,7 +33,8 @@ struct Live : TestProgram {
   std::string NmeaKml() const { return folder.File("nmea.kml"); }
   // Fix number `i` of kFixes as the real-time handler takes it.
   void Fix(int i) {
-    ParseNMEA(*m, Rmc(kFixes[i], kLatitudes[i], "010.0", "090.0"));
+    std::string sentence = Rmc(kFixes[i], kLatitudes[i], "010.0", "090.0");
+    ParseNMEA(*m, sentence);
     m->Track.PointCount += 1;
     WriteNmeaKmlFile(*m);
   }
