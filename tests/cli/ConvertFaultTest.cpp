@@ -101,6 +101,37 @@ TEST(ConvertFault, DiskFullAtEveryByteStageOfEachFormat) {
   }
 }
 
+// Waypoint output goes through the same file; its failures are reported by the waypoint reader,
+// which owns the file from head to tail, except the KML tail's own.
+TEST(ConvertFault, DiskFullUnderWaypointOutput) {
+  struct Case {
+    const char* input;
+    const char* name;
+    const char* message;
+  };
+  const Case cases[] = {
+      {"sample.wpt", "w.kml", "Error: WriteKmlFooter bug"},
+      {"sample.wpt", "w.gpx", " Whoa! An error!: ReadWaypointFile snag"},
+      {"sample-waypoints.gpx", "w.plt", " Whoa! An error!: ReadWaypointFile snag"},
+  };
+  for (const Case& k : cases) {
+    FaultyConverter c;
+    const std::string type = std::string(k.input) == "sample.wpt" ? "ozi-wpt" : "gpx-wpt";
+    const std::string arguments = "--type " + type + " " + Quote(Sample(k.input)) + " " + Quote(c.Target(k.name));
+    const Outcome first = c("", arguments);
+    ASSERT_EQ(first.status, 0) << first.err;
+    const std::string complete = ReadFile(c.Target(k.name));
+    for (const std::size_t cut : {std::size_t{0}, complete.size() / 2, complete.size() - 1}) {
+      WriteFile(c.Target(k.name), kPrevious);
+      ExpectNothingWritten(c, c("MOLVAR_FAULT_WRITE_BUDGET=" + std::to_string(cut), arguments), k.name,
+                           std::string(k.message) + " Disk full (" + c.Target(k.name) + ": No space left on device)",
+                           std::string(k.name) + " cut at " + std::to_string(cut));
+    }
+    EXPECT_EQ(c("", arguments).status, 0);
+    EXPECT_EQ(ReadFile(c.Target(k.name)), complete);
+  }
+}
+
 // The shim refuses new files in the folder to root as well; without root, the folder's mode does
 // the same for real.
 TEST(ConvertFault, OutputFolderThatTakesNoNewFile) {
