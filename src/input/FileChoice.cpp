@@ -2,7 +2,6 @@
 
 #include <array>
 #include <cerrno>
-#include <cstring>
 #include <fstream>
 #include <iterator>
 
@@ -32,7 +31,7 @@ constexpr std::size_t kLongFirstLine = 300;
 [[noreturn]] void ThrowOpenFailure(const std::string& path) {
   const int err = errno != 0 ? errno : ENOENT;
   const int number = err == ENOENT ? kErrFileNotFound : kErrPathFileAccess;
-  throw RuntimeError(number, RuntimeError::StandardDescription(number) + " (" + path + ": " + std::strerror(err) + ")");
+  throw FileError(number, path, err);
 }
 
 bool InWaypointMode(const Molvar& m) { return m.ProgramMode == kModeConvertWaypoints; }

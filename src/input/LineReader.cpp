@@ -8,16 +8,12 @@
 namespace molvar {
 namespace {
 constexpr std::size_t kChunk = 1 << 20;
-
-[[noreturn]] void Fail(const std::string& path, int number, int err) {
-  throw RuntimeError(number, RuntimeError::StandardDescription(number) + " (" + path + ": " + std::strerror(err) + ")");
-}
 }  // namespace
 
 LineReader::LineReader(const std::string& path) : path_(path), file_(std::fopen(path.c_str(), "rb")) {
   if (!file_) {
     const int err = errno;
-    Fail(path, err == ENOENT ? kErrFileNotFound : kErrPathFileAccess, err);
+    throw FileError(err == ENOENT ? kErrFileNotFound : kErrPathFileAccess, path, err);
   }
 }
 
@@ -32,7 +28,7 @@ bool LineReader::Fill() {
   const int err = errno;
   buffer_.resize(old + got);
   if (got < kChunk) {
-    if (std::ferror(file_.get())) Fail(path_, kErrPathFileAccess, err != 0 ? err : EIO);
+    if (std::ferror(file_.get())) throw FileError(kErrPathFileAccess, path_, err != 0 ? err : EIO);
     eof_ = true;
   }
   return got > 0;
