@@ -1,5 +1,6 @@
 #include "core/Errors.h"
 
+#include <cstring>
 #include <new>
 
 namespace molvar {
@@ -21,6 +22,10 @@ std::string RuntimeError::StandardDescription(int number) {
     case kErrNoControlElement: return "Control array element does not exist";
     default: return "Application-defined or object-defined error";
   }
+}
+
+RuntimeError FileError(int number, const std::string& path, int err) {
+  return RuntimeError(number, RuntimeError::StandardDescription(number) + " (" + path + ": " + std::strerror(err) + ")");
 }
 
 std::string ErrorDescription(const std::exception& e) {

@@ -37,6 +37,10 @@ class RuntimeError : public std::runtime_error {
   int number_;
 };
 
+// A failed file operation: error `number` with its standard description, the file and the
+// system's reason for `err` (an errno value): "Disk full (/data/out.kml: No space left on device)".
+RuntimeError FileError(int number, const std::string& path, int err);
+
 // The description a handler shows for any exception that reached it.
 std::string ErrorDescription(const std::exception& e);
 int ErrorNumberOf(const std::exception& e);

@@ -1,6 +1,7 @@
 #include "input/FileChoice.h"
 
 #include <array>
+#include <cerrno>
 #include <fstream>
 #include <string_view>
 #include <vector>
@@ -28,12 +29,20 @@ constexpr std::array<std::string_view, kTrackFileTypeCount> kTrackFilters = {
 
 constexpr std::size_t kLongFirstLine = 300;
 
+// The same message the line reader gives: the file and the system's reason.
+[[noreturn]] void ThrowOpenFailure(const std::string& path) {
+  const int err = errno != 0 ? errno : ENOENT;
+  const int number = err == ENOENT ? kErrFileNotFound : kErrPathFileAccess;
+  throw FileError(number, path, err);
+}
+
 bool InWaypointMode(const Molvar& m) { return m.ProgramMode == kModeConvertWaypoints; }
 
 // Whether the text before the first CR (or the end) is longer than kLongFirstLine.
 bool FirstLineIsLong(const std::string& path) {
+  errno = 0;
   std::ifstream in(path, std::ios::binary);
-  if (!in) throw RuntimeError(kErrFileNotFound, "File not found: " + path);
+  if (!in) ThrowOpenFailure(path);
   std::string head(kLongFirstLine + 1, '\0');
   in.read(head.data(), static_cast<std::streamsize>(head.size()));
   head.resize(static_cast<std::size_t>(in.gcount()));
@@ -122,8 +131,9 @@ void FixLineEnds(Molvar& m) {
   const std::string& path = m.LastSourceFile;
   // Only a long first line asks for a look at the whole file.
   if (!FirstLineIsLong(path)) return;
+  errno = 0;
   std::ifstream in(path, std::ios::binary);
-  if (!in) throw RuntimeError(kErrFileNotFound, "File not found: " + path);
+  if (!in) ThrowOpenFailure(path);
   // Streamed into the replacement, so a large file costs no more memory than a small one.
   OutputFile out;
   out.SetDurable(true);
@@ -147,7 +157,7 @@ void FixLineEnds(Molvar& m) {
     out.Raw(data.substr(from));
     last = data.back();
   }
-  if (in.bad()) throw RuntimeError(kErrPathFileAccess, "Path/File access error: " + path);
+  if (in.bad()) throw FileError(kErrPathFileAccess, path, errno != 0 ? errno : EIO);
   // Only the line ends change; a long first line with proper line ends is left as it is.
   if (!changed) return;  // the untouched replacement is dropped
   if (last != '\n') out.Raw("\r\n");

@@ -21,11 +21,10 @@ const char* FindLineEnd(const char* start, std::size_t n) {
 
 }  // namespace
 
-LineReader::LineReader(const std::string& path) : file_(std::fopen(path.c_str(), "rb")) {
+LineReader::LineReader(const std::string& path) : path_(path), file_(std::fopen(path.c_str(), "rb")) {
   if (!file_) {
     const int err = errno;
-    const int number = err == ENOENT ? kErrFileNotFound : kErrPathFileAccess;
-    throw RuntimeError(number, RuntimeError::StandardDescription(number) + " (" + path + ": " + std::strerror(err) + ")");
+    throw FileError(err == ENOENT ? kErrFileNotFound : kErrPathFileAccess, path, err);
   }
   buffer_.resize(kChunk);
 }
@@ -33,8 +32,14 @@ LineReader::LineReader(const std::string& path) : file_(std::fopen(path.c_str(),
 bool LineReader::Fill() {
   pos_ = size_ = 0;
   if (eof_) return false;
+  errno = 0;
   size_ = std::fread(buffer_.data(), 1, kChunk, file_.get());
-  if (size_ < kChunk) eof_ = true;
+  const int err = errno;
+  if (size_ < kChunk) {
+    // A failed read (a folder, a device error) must not pass for the end of the file.
+    if (std::ferror(file_.get())) throw FileError(kErrPathFileAccess, path_, err != 0 ? err : EIO);
+    eof_ = true;
+  }
   return size_ > 0;
 }
 

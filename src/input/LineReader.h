@@ -18,7 +18,9 @@ class LineReader {
   explicit LineReader(const std::string& path);
 
   // The next line without its line end; false at the end of the file. The view stays valid until
-  // the next call: most lines are handed out straight from the buffer, without a copy.
+  // the next call: most lines are handed out straight from the buffer, without a copy. A failed
+  // read (a folder, a device error) raises RuntimeError 75 naming the path and the reason instead
+  // of passing for the end of the file.
   bool Next(std::string_view& line);
   bool Next(std::string& line);
 
@@ -28,6 +30,7 @@ class LineReader {
   struct Closer {
     void operator()(std::FILE* f) const { std::fclose(f); }
   };
+  std::string path_;
   std::unique_ptr<std::FILE, Closer> file_;
   std::vector<char> buffer_;
   std::size_t pos_ = 0;

@@ -1,7 +1,6 @@
 #include "output/OutputFile.h"
 
 #include <cerrno>
-#include <cstring>
 #include <system_error>
 
 #include "core/Errors.h"
@@ -141,8 +140,7 @@ void OutputFile::Abandon() {
 
 void OutputFile::Fail(int err) {
   const int number = ErrorNumberFor(err);
-  throw RuntimeError(number, RuntimeError::StandardDescription(number) + " (" + path_ + ": " +
-                                 std::strerror(err) + ")");
+  throw FileError(number, path_, err);
 }
 
 void WriteFileAtomically(const std::string& path, std::string_view content, bool durable, bool privateFile) {

@@ -13,6 +13,7 @@
 #include "input/Nmea.h"
 #include "output/kml/LiveFiles.h"
 #include "support/Peers.h"
+#include "support/Sentences.h"
 #include "support/TestProgram.h"
 
 namespace molvar {
@@ -21,22 +22,12 @@ namespace {
 using testing::ExpectInOrder;
 using testing::ExpectWellFormedXml;
 using testing::ReadFile;
+using testing::Rmc;
 using testing::RunCommand;
 using testing::TestProgram;
 
 std::string Golden(const std::string& name, const std::string& folder) {
   return Replace(ReadFile(std::string(MOLVAR_GOLDEN_DIR) + "/live/" + name), "{FOLDER}", folder);
-}
-
-// A $GPRMC sentence with its checksum, the way a receiver sends it (with its line end).
-std::string Rmc(const std::string& time, const std::string& latitude, const std::string& knots,
-                const std::string& course) {
-  const std::string body = "GPRMC," + time + ",A," + latitude + ",N,07500.0000,W," + knots + "," + course + ",061226,,";
-  int x = 0;
-  for (char c : body) x ^= static_cast<unsigned char>(c);
-  char hex[3];
-  std::snprintf(hex, sizeof hex, "%02X", x);
-  return "$" + body + "*" + hex + "\r\n";
 }
 
 // Latitude text of 45 degrees and `hundredths` hundredths of a degree north.
