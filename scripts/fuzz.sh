@@ -2,7 +2,8 @@
 # Builds the libFuzzer targets (clang, ASan + UBSan) and runs them.
 #   scripts/fuzz.sh run [TARGET...]      each target FUZZ_SECONDS (60) from its corpus
 #   scripts/fuzz.sh regress [TARGET...]  every corpus file once, then FUZZ_SHORT_SECONDS (10) each
-# New corpus entries and crash files go to $FUZZ_BUILD/corpus and $FUZZ_BUILD/artifacts, never into
+# New corpus entries and crash files go to $FUZZ_BUILD/corpus (regress: $FUZZ_BUILD/regress-corpus)
+# and $FUZZ_BUILD/artifacts, never into
 # tests/fuzz-corpus. FUZZ_RESULTS=FILE appends one line of figures per run. Any crash, hang (over
 # 1 s per input), leak, sanitizer report or memory over 2 GB fails the script.
 set -euo pipefail
@@ -37,17 +38,18 @@ max_len() {
   esac
 }
 
-# One fuzzing run of `target` for `secs` seconds, seeded from its corpus.
+# One fuzzing run of `target` for `secs` seconds, seeded from its corpus and from the scratch
+# folder `scratch_root`/TARGET, which gets the new entries.
 fuzz_for() {
-  local target=$1 secs=$2
-  local exe="$build/fuzz/$target" scratch="$build/corpus/$target" artifacts="$build/artifacts/$target/"
+  local target=$1 secs=$2 scratch_root=$3
+  local exe="$build/fuzz/$target" scratch="$scratch_root/$target" artifacts="$build/artifacts/$target/"
   local log="$build/logs/$target.log"
   mkdir -p "$scratch" "$artifacts" "$(dirname "$log")" "$corpus_root/$target"
   local status=0
   "$exe" -max_total_time="$secs" -timeout=1 -rss_limit_mb=2048 -detect_leaks=1 -max_len="$(max_len "$target")" \
     -print_final_stats=1 -artifact_prefix="$artifacts" "$scratch" "$corpus_root/$target" >"$log" 2>&1 || status=$?
   local done_line execs
-  done_line=$(grep -E '^#[0-9]+ +DONE' "$log" | tail -1 || true)
+  done_line=$(grep -E '^#[0-9]+[[:space:]]+DONE' "$log" | tail -1 || true)
   execs=$(sed -n 's/^stat::number_of_executed_units: *//p' "$log" | tail -1)
   local cov ft
   cov=$(sed -n 's/.* cov: \([0-9]*\).*/\1/p' <<<"$done_line")
@@ -64,7 +66,8 @@ fuzz_for() {
 
 # Every corpus file of `target` once.
 replay() {
-  local target=$1 exe="$build/fuzz/$target" log="$build/logs/$target.replay.log"
+  local target=$1
+  local exe="$build/fuzz/$target" log="$build/logs/$target.replay.log"
   mkdir -p "$(dirname "$log")"
   local files=("$corpus_root/$target"/*)
   [ -e "${files[0]}" ] || { echo "$target: no corpus" >&2; return 1; }
@@ -80,9 +83,12 @@ failed=0
 for t in "${targets[@]}"; do
   if [ "$mode" = regress ]; then
     replay "$t" || { failed=1; continue; }
-    fuzz_for "$t" "$short" || failed=1
+    # The short run starts from the committed corpus alone, so its length does not grow with the
+    # scratch corpus of earlier long runs.
+    rm -rf "$build/regress-corpus/$t"
+    fuzz_for "$t" "$short" "$build/regress-corpus" || failed=1
   else
-    fuzz_for "$t" "$seconds" || failed=1
+    fuzz_for "$t" "$seconds" "$build/corpus" || failed=1
   fi
 done
 exit $failed
