@@ -2,6 +2,7 @@
 
 #include <cstdio>
 #include <cstdlib>
+#include <filesystem>
 #include <fstream>
 
 #include "app/Options.h"
@@ -72,7 +73,18 @@ const testing::TempFolder& RunFolder() {
   return folder;
 }
 
-FuzzProgram::FuzzProgram() : m(std::make_unique<Molvar>(platform, RunFolder().path().string())) {}
+// Each input starts in an empty folder, so no file of an earlier input changes what it does. Files
+// are removed rather than truncated or renamed over: on ext4 both of those start a write-back of
+// the old data, and on a busy disk that stalled an input past the 1 s hang limit.
+static void EmptyRunFolder() {
+  std::error_code ec;
+  for (const auto& entry : std::filesystem::directory_iterator(RunFolder().path(), ec)) {
+    std::error_code ignored;
+    std::filesystem::remove_all(entry.path(), ignored);
+  }
+}
+
+FuzzProgram::FuzzProgram() : m(std::make_unique<Molvar>(platform, RunFolder().path().string())) { EmptyRunFolder(); }
 
 void ApplyOptions(Molvar& m, uint8_t bits) {
   auto& f = m.frmMain;
@@ -97,7 +109,9 @@ void ApplyOptions(Molvar& m, uint8_t bits) {
 }
 
 void WriteFuzzFile(const std::string& path, std::string_view content) {
-  std::ofstream out(path, std::ios::binary | std::ios::trunc);
+  std::error_code ignored;
+  std::filesystem::remove(path, ignored);
+  std::ofstream out(path, std::ios::binary);
   out.write(content.data(), static_cast<std::streamsize>(content.size()));
   if (!out) {
     std::fprintf(stderr, "==fuzz== cannot write %s\n", path.c_str());

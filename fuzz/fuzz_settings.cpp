@@ -1,7 +1,6 @@
 // Molvar.ini made of the input through the start-up load (defaults, file, replay of the options
 // as clicks), then written back.
 #include <cstdint>
-#include <filesystem>
 
 #include "FuzzProgram.h"
 #include "app/Settings.h"
@@ -13,8 +12,6 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, std::size_t size) {
   fuzz::FuzzProgram p;
   Molvar& m = *p;
   fuzz::WriteFuzzFile(p.File(kSettingsFileName), in.rest);
-  std::error_code ignored;
-  std::filesystem::remove(p.File(kTrackDataFileName), ignored);
   LoadSettings(m);
   SaveSettings(m);
   return 0;
