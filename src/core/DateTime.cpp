@@ -415,6 +415,8 @@ CompactString OziDateToText(std::string_view field, int gmtMinutes) {
   const double fraction = point == std::string_view::npos ? 0.0 : Val(field.substr(point));
   const double seconds = std::nearbyint(fraction * kSecondsPerDay);
   if (!std::isfinite(days) || std::fabs(days) > 4.0e6) return {};
+  // An exponent in the fraction (".5e40") can carry it past any date, and past what converts.
+  if (!std::isfinite(seconds) || std::fabs(seconds) > 1.0e15) return {};
   const TimeSeconds t = static_cast<TimeSeconds>(days) * kSecondsPerDay +
                         static_cast<TimeSeconds>(gmtMinutes) * 60 + static_cast<TimeSeconds>(seconds);
   if (!InDateRange(t)) return {};
