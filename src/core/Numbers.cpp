@@ -239,7 +239,7 @@ void AppendPattern(std::string& out, double v, int minIntegerDigits, int decimal
   if (!std::isfinite(v)) v = 0;
   // Digits of the rounded magnitude, most significant first, with `decimals` digits after the
   // implied point: value = digits × 10^-decimals.
-  std::array<char, 72> digits{};
+  std::array<char, 352> digits{};  // room for the 309 integer digits of the largest double
   int count = 0;
   bool negative = false;
   if (v != 0) {
@@ -250,7 +250,7 @@ void AppendPattern(std::string& out, double v, int minIntegerDigits, int decimal
     if (keep > 0) {
       const int fromDigits = keep < 15 ? keep : 15;
       for (int k = 0; k < fromDigits; ++k) digits[static_cast<std::size_t>(count++)] = d.digits[static_cast<std::size_t>(k)];
-      for (int k = 15; k < keep && count < 64; ++k) digits[static_cast<std::size_t>(count++)] = '0';
+      for (int k = 15; k < keep && count < 340; ++k) digits[static_cast<std::size_t>(count++)] = '0';
       if (keep < 15 && d.digits[static_cast<std::size_t>(keep)] >= '5') {
         int k = count - 1;
         while (k >= 0 && digits[static_cast<std::size_t>(k)] == '9') digits[static_cast<std::size_t>(k--)] = '0';

@@ -224,6 +224,10 @@ TEST(FormatPattern, PadsIntegerDigitsOnBothPaths) {
   EXPECT_EQ(FormatPattern(-0.06, "0.0"), "-0.1");
   EXPECT_EQ(FormatPattern(0.000123, "0.000000"), "0.000123");
   EXPECT_EQ(FormatPattern(123456.7, "0"), "123457");
+  // Every integer digit of a huge value (a speed field can hold one).
+  EXPECT_EQ(FormatPattern(1e64, "0.0"), "1" + std::string(64, '0') + ".0");
+  EXPECT_EQ(FormatPattern(-1.5e300, "0").size(), 302u);
+  EXPECT_EQ(FormatPattern(1.7976931348623157e308, "0").substr(0, 15), "179769313486232");
 }
 
 }  // namespace
